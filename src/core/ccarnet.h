@@ -72,6 +72,32 @@ public:
     static double formatZ(double v);
     static double formatAng(double v);
 
+    // ---- Element queries ----
+    int Find(unsigned int type, const CString& np, int first, int end) const;
+    CString cmdAt(int i);
+    CString matAt(int i);
+    CString symAt(int i);
+    CString parAt(int i);
+
+    // ---- Loading and validation ----
+    int Load(CNorvexTxtWnd* pWnd, const CString& fileName, int bAppend, CWnd* pParent);
+    int Load(CNorvexTxtWnd* pWnd, const CString& fileName, const CString& paramFile, int bAppend, CWnd* pParent);
+    int FileOpen(const CString& initialName, CWnd* pParent);
+    void* ReadLine(CNorvexTxtWnd* pWnd, CString line, int& index, int bAppend);
+    CStation* validStation(CNorvexTxtWnd* pWnd, CStation* p, int line);
+    CReference* validReference(CNorvexTxtWnd* pWnd, CReference* p, int line);
+    CMesure* validMesure(CNorvexTxtWnd* pWnd, CMesure* p, int line);
+    CPointGen* validPoint(CNorvexTxtWnd* pWnd, CPointGen* p, int line);
+    void validComment(const char* fmt, const CString& a, const CString& b);
+
+    // ---- Saving, backup and options ----
+    int Save(const CString& fileName, CWnd* pParent, bool bAppend);
+    int FileSave(const CString& initialName);
+    void Write(std::FILE* f, int n);
+    void Write(std::FILE* f, const CString& paramFile, int n);
+    void BackUp();
+    void WriteOptions(std::FILE* f);
+
     // ---- Element copy and assignment ----
     void* copyElement(int from, int to);
     const CCarnet& operator=(const CCarnet& other);

@@ -1,6 +1,8 @@
 #include <carnet/numconv.h>
 
+#include <charconv>
 #include <climits>
+#include <cstring>
 #include <clocale>
 #include <cstdio>
 #include <cstdlib>
@@ -32,29 +34,41 @@ private:
 
 double Atof(const char* s) {
     if (!s) return 0.0;
-    const char* p = s;
-    while (cp1252::IsSpace(static_cast<unsigned char>(*p))) ++p;
+    return Atof(std::string_view(s));
+}
+
+double Atof(std::string_view text) {
+    const char* p = text.data();
+    const char* const end = p + text.size();
+    auto digit = [&](const char* q) { return q < end && cp1252::IsDigit(static_cast<unsigned char>(*q)); };
+    while (p < end && cp1252::IsSpace(static_cast<unsigned char>(*p))) ++p;
+    bool negative = false;
+    if (p < end && (*p == '+' || *p == '-')) negative = (*p++ == '-');
     const char* start = p;
-    if (*p == '+' || *p == '-') ++p;
-    const char* digits = p;
-    while (cp1252::IsDigit(static_cast<unsigned char>(*p))) ++p;
-    bool any = p > digits;
-    if (*p == '.') {
+    while (digit(p)) ++p;
+    bool any = p > start;
+    if (p < end && *p == '.') {
         const char* frac = ++p;
-        while (cp1252::IsDigit(static_cast<unsigned char>(*p))) ++p;
+        while (digit(p)) ++p;
         any = any || p > frac;
     }
     if (!any) return 0.0;
-    if (*p == 'e' || *p == 'E') {
+    if (p < end && (*p == 'e' || *p == 'E')) {
         const char* q = p + 1;
-        if (*q == '+' || *q == '-') ++q;
+        if (q < end && (*q == '+' || *q == '-')) ++q;
         const char* exp = q;
-        while (cp1252::IsDigit(static_cast<unsigned char>(*q))) ++q;
+        while (digit(q)) ++q;
         if (q > exp) p = q;
     }
-    // Only the validated prefix reaches strtod, so no special form is read.
-    std::string text(start, static_cast<size_t>(p - start));
-    return strtod_l(text.c_str(), nullptr, CLocale());
+    // Only the validated decimal prefix is converted, so no special form
+    // ("inf", "nan", hexadecimal) can be read.
+    double value = 0.0;
+    auto result = std::from_chars(start, p, value, std::chars_format::general);
+    if (result.ec == std::errc::result_out_of_range) {
+        // Rare: let the C library pick infinity or zero, as atof does.
+        value = strtod_l(std::string(start, p).c_str(), nullptr, CLocale());
+    }
+    return negative ? -value : value;
 }
 
 int Atoi(const char* s) {

@@ -4,6 +4,7 @@
 
 #include <cstdarg>
 #include <string>
+#include <string_view>
 
 namespace numconv {
 
@@ -11,6 +12,7 @@ namespace numconv {
 // optional fraction, optional exponent. Anything else ("inf", "nan", "0x1p3"
 // beyond its leading "0") stops the number; no number at all gives 0.0.
 double Atof(const char* s);
+double Atof(std::string_view text);
 // atoi that saturates at the int range instead of wrapping.
 int Atoi(const char* s);
 

@@ -1,0 +1,118 @@
+#include <string>
+#include <unordered_map>
+
+#include <carnet/cp1252.h>
+#include <carnet/numconv.h>
+
+#include "file/file_texts_internal.h"
+#include "file/reader_internal.h"
+
+namespace carnet_reader {
+namespace {
+
+bool IsSpace(char c) { return cp1252::IsSpace(static_cast<unsigned char>(c)); }
+
+// Takes the word at the front of s (up to the first blank) and skips the
+// white space after it.
+std::string_view TakeWord(std::string_view& s) {
+    size_t end = s.find(' ');
+    std::string_view word = s.substr(0, end);
+    size_t next = end == std::string_view::npos ? s.size() : end;
+    while (next < s.size() && IsSpace(s[next])) ++next;
+    s.remove_prefix(next);
+    return word;
+}
+
+bool AllDigits(std::string_view w) {
+    if (w.empty()) return false;
+    for (char c : w)
+        if (!cp1252::IsDigit(static_cast<unsigned char>(c))) return false;
+    return true;
+}
+
+// Keyword to type code, built once from the type table.
+const std::unordered_map<std::string_view, unsigned int>& Keywords() {
+    static const std::unordered_map<std::string_view, unsigned int> map = [] {
+        std::unordered_map<std::string_view, unsigned int> m;
+        for (unsigned int code = CARNET_FIRST_TYPE; code <= CARNET_LAST_TYPE; ++code)
+            for (const char* kw : CarnetTypeInfo(code)->keywords)
+                if (kw) m.emplace(kw, code);
+        return m;
+    }();
+    return map;
+}
+
+}  // namespace
+
+bool CutLine(std::string_view line, LineCut& cut) {
+    size_t b = 0, e = line.size();
+    while (b < e && IsSpace(line[b])) ++b;
+    while (e > b && IsSpace(line[e - 1])) --e;
+    std::string_view s = line.substr(b, e - b);
+    cut.words.clear();
+    cut.keyword = {};
+    cut.rest = {};
+    std::string_view probe = s;
+    if (AllDigits(TakeWord(probe))) s = probe;
+    if (s.empty()) return false;
+    cut.keyword = TakeWord(s);
+    cut.rest = s;
+    while (!s.empty()) cut.words.push_back(TakeWord(s));
+    return true;
+}
+
+double ReadContext::Number(size_t i) const {
+    return numconv::Atof(cut.words[i]);
+}
+
+void* ReadContext::Store(void* p, unsigned int code) {
+    if (index >= book.length()) {
+        book.append(p, code);
+    } else {
+        book.setPtrAt(index, p);
+        book.setTypAt(index, code);
+    }
+    return p;
+}
+
+void ReadContext::Report(const char* format) {
+    if (!wnd) return;
+    wnd->Printf(1, format, index + 1, std::string(cut.keyword).c_str());
+    wnd->Printf(1, carnet_texts::kShowLine, std::string(line).c_str());
+}
+
+void* ReadContext::Incomplete() {
+    Report(carnet_texts::kIncomplete);
+    return nullptr;
+}
+
+void* ReadContext::Incorrect() {
+    Report(carnet_texts::kIncorrect);
+    return nullptr;
+}
+
+void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend) {
+    if (line.empty()) return nullptr;
+    assert(index >= 0 && index <= book.length());
+    ReadContext ctx(book, wnd, line, index, bAppend);
+    if (!CutLine(line, ctx.cut)) {
+        if (wnd) {
+            wnd->Printf(1, carnet_texts::kNoCommand, index + 1);
+            wnd->Printf(1, carnet_texts::kShowLine, std::string(line).c_str());
+        }
+        return nullptr;
+    }
+    const auto& keywords = Keywords();
+    auto it = keywords.find(ctx.cut.keyword);
+    if (it == keywords.end()) return ctx.Incorrect();
+    const unsigned int code = it->second;
+    if (code < CARNET_FIRST_DRAWING_TYPE) return ReadRecordLine(ctx, code);
+    // Drawing-command lines are not read yet: reported like any unknown keyword.
+    return ctx.Incorrect();
+}
+
+}  // namespace carnet_reader
+
+void* CCarnet::ReadLine(CNorvexTxtWnd* pWnd, CString line, int& index, int bAppend) {
+    return carnet_reader::ReadOneLine(*this, pWnd, line.str(), index, bAppend);
+}

@@ -1,0 +1,63 @@
+// The field-book line reader: cutting a line into its frame, and the context
+// that each branch of the reader (records, drawing commands, options) gets.
+#pragma once
+
+#include <string_view>
+#include <vector>
+
+#include <carnet/ccarnet.h>
+#include <carnet/cstring.h>
+#include <carnet/txtwnd.h>
+
+namespace carnet_reader {
+
+// A line cut into keyword and words. The views point into the line given to
+// CutLine, which must outlive the cut.
+struct LineCut {
+    std::string_view keyword;
+    std::string_view rest;  // everything after the keyword and its white space
+    std::vector<std::string_view> words;
+};
+
+// Trims the line, drops a line-number prefix, takes the keyword and cuts the
+// rest into words (a word ends at a blank; white space after a word is
+// skipped). False when no keyword is left.
+bool CutLine(std::string_view line, LineCut& cut);
+
+// Everything a branch of the reader needs to build, store and report.
+class ReadContext {
+public:
+    ReadContext(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend)
+        : book(book), wnd(wnd), line(line), index(index), bAppend(bAppend) {}
+
+    CCarnet& book;
+    CNorvexTxtWnd* wnd;
+    std::string_view line;  // as passed in, shown after every message
+    int& index;
+    int bAppend;
+    LineCut cut;
+
+    size_t WordCount() const { return cut.words.size(); }
+    CString Word(size_t i) const { return CString(std::string(cut.words[i])); }
+    double Number(size_t i) const;
+
+    // Stores a new element at the reader's position: appended when the
+    // position is the book's length, else written over the entry there (the
+    // old element is left to the caller). Returns p.
+    void* Store(void* p, unsigned int code);
+
+    // "commande <%s> incomplète": the words do not fit the keyword.
+    void* Incomplete();
+    // "commande <%s> incorrecte": the keyword is unknown here.
+    void* Incorrect();
+    // A message with the line number and the keyword, then " (%s)" with the line.
+    void Report(const char* format);
+};
+
+// ReadLine on a line held anywhere (the loader reads into its own buffer).
+void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend);
+
+// The record branches (types 1000 to 1010); null when no element was made.
+void* ReadRecordLine(ReadContext& ctx, unsigned int code);
+
+}  // namespace carnet_reader
