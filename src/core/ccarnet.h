@@ -98,6 +98,12 @@ public:
     void BackUp();
     void WriteOptions(std::FILE* f);
 
+    // ---- Projection lookup and face reduction ----
+    void Projection(const CString& fileName, CString& name);
+    static double avCD(double av);
+    static double ahCD(double ah, double av);
+    static int setCD(double& ah, double& av);
+
     // ---- Element copy and assignment ----
     void* copyElement(int from, int to);
     const CCarnet& operator=(const CCarnet& other);

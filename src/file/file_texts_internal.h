@@ -22,4 +22,9 @@ inline constexpr const char* kOpenTitle = "S\xE9lectionnez la Sitebook \xE0 char
 inline constexpr const char* kSaveTitle = "Enregistrer la Sitebook sous";
 inline constexpr const char* kFilter = "Sitebook NORVEX (*.geo)|*.geo||";
 
+// Projection names chosen by the zone number of a "Cal_Cor" line (0 to 3).
+inline constexpr const char* kLambertZones[4] = {"Projection Lambert Zone I", "Projection Lambert Zone II",
+                                                 "Projection Lambert Zone III", "Projection Lambert Zone IV"};
+inline constexpr const char* kNoProjection = "Aucune";
+
 }  // namespace carnet_texts
