@@ -79,6 +79,29 @@ public:
     CString symAt(int i);
     CString parAt(int i);
 
+    // ---- Point numbers and selection strings ----
+    static void extrMat(const CString& np, CString& radical, int& number, int& dotted, int dropDots);
+    static void extrMat(const CString& np, CString& radical, int& number);
+    static void formMat(const CString& radical, int number, int& dotted, CString& out);
+    static void formMat(CString& np, CString& radical, int& number, int& dotted, int keepStars);
+    static void formMat(const CString& np, CString& out);
+    static void formMat(CString& np);
+    static void extrStaRep(const CString& ref, CString& radical, int& number, int& rep, int& dotted, int dropDots);
+    int extrStaRep(const CString& ref, CString& station, int& rep) const;
+    int findStaRep(const CString& station, int rep) const;
+    int findMat(const CString& np);
+    int lastInd(const CString& radical);
+    CString lastMat(unsigned int type, int& index);
+    CString lastMat(unsigned int type);
+    CString nextMat(const CString& np);
+    CString nextMat(unsigned int type, int& index);
+    CString nextMat(unsigned int type);
+    static int IsValidSelString(CString& sel);
+    static int IsPointInSel(const CString& np, const CString& sel);
+    static int GetSelStringCount(const CString& sel);
+    static void DDX_Mat(CWnd* dlg, int id, CString& np);
+    int DDV_Mat(CWnd* parent, int index, const CString& np);
+
     // ---- Loading and validation ----
     int Load(CNorvexTxtWnd* pWnd, const CString& fileName, int bAppend, CWnd* pParent);
     int Load(CNorvexTxtWnd* pWnd, const CString& fileName, const CString& paramFile, int bAppend, CWnd* pParent);
