@@ -252,14 +252,3 @@ TEST_F(Params, NamelessLocationsAreReportedAfterAnotherOne) {
                            "Pas de nom pour le fichier de param\xE8tres !\n(Code d'erreur 2)",
                        }));
 }
-
-TEST_F(Params, WrittenProfileKeepsTheRestOfTheFile) {
-    const std::string file = Path("host.ini");
-    const std::string before = "; host settings\r\n[Fen\xEAtre]\r\nX = 10\r\n[Options_Corrections]\r\nRayonTerre=6366\r\n";
-    WriteFile(file, before);
-    EXPECT_NE(SetParamDouble(file.c_str(), "Options_Corrections", "RayonTerre", 6500.123), 0);
-    EXPECT_NE(SetParamString(file.c_str(), "Options_Corrections", "Projection", "Aucune"), 0);
-    EXPECT_EQ(ReadFile(file), "; host settings\r\n[Fen\xEAtre]\r\nX = 10\r\n[Options_Corrections]\r\n"
-                              "RayonTerre=6500.123000\r\nProjection=Aucune\r\n");
-    EXPECT_EQ(store_test::Entries(Dir()), std::vector<std::string>{"host.ini"});
-}

@@ -120,15 +120,6 @@ TEST_F(Registry, DefaultFolderFollowsTheEnvironment) {
     EXPECT_EQ(RegistryFolder(), Path("home") + "/.config/carnet/registry");
 }
 
-TEST_F(Registry, UnusableFolderFailsWithItsErrorCode) {
-    WriteFile(Path("plain"), "x");
-    SetRegistryFolder(Path("plain/registry").c_str());
-    EXPECT_EQ(RegistrySetString("HKEY_CURRENT_USER", "K", "v", "x"), ENOTDIR);
-    std::string value;
-    EXPECT_NE(RegistryGetString("HKEY_CURRENT_USER", "K", "v", value), 0);
-    EXPECT_EQ(ReadFile(Path("plain")), "x");
-}
-
 TEST_F(Registry, ForeignLinesAreSkippedAndFirstNamesWin) {
     std::filesystem::create_directory(Path("registry"));
     WriteFile(Path("registry/HKEY_USERS.txt"),
