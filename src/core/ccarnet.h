@@ -78,6 +78,44 @@ public:
     CString matAt(int i);
     CString symAt(int i);
     CString parAt(int i);
+    // Typed values of the element at an index; UNDEF_VALUE for another type.
+    double xAt(int i) const;
+    double yAt(int i) const;
+    double zAt(int i) const;
+    double hiAt(int i) const;
+    double v0At(int i) const;
+    double hpAt(int i) const;
+    double ahAt(int i) const;
+    double avAt(int i) const;
+    double diAt(int i) const;
+    double lmAt(int i) const;
+    double dhAt(int i) const;
+    // Eccentric of the observation at i, searched above index `lower`.
+    double findER(int i, int lower) const;
+    double findET(int i, int lower) const;
+    double findEV(int i, int lower) const;
+    // The first point (type 1006) of a number, or of the element's number.
+    int hasPnt(const CString& np) const;
+    int hasPnt(int i) const;
+    int hasPnt(const CString& np, double& x, double& y, double& z) const;
+    int hasPnt(int i, double& x, double& y, double& z) const;
+    int hasXYZ(const CString& np) const;
+    int hasXYZ(int i) const;
+    int hasXYZ(const CString& np, double& x, double& y, double& z) const;
+    int hasXYZ(int i, double& x, double& y, double& z) const;
+    int hasXY(const CString& np) const;
+    int hasXY(int i) const;
+    int hasXY(const CString& np, double& x, double& y) const;
+    int hasXY(int i, double& x, double& y) const;
+    int hasZ(const CString& np) const;
+    int hasZ(int i) const;
+    int hasZ(const CString& np, double& z) const;
+    int hasZ(int i, double& z) const;
+    double zFor(const CString& np) const;
+    double zFor(int i) const;
+    CAppareil* findAppAt(int i) const;
+    int findRepAt(int i, CString& np) const;
+    int isObsAltiAt(int i, int bStation) const;
 
     // ---- Point numbers and selection strings ----
     static void extrMat(const CString& np, CString& radical, int& number, int& dotted, int dropDots);

@@ -1,18 +1,8 @@
 #include <carnet/ccarnet.h>
 
-#include "core/dispatch_internal.h"
+#include "points/element_access_internal.h"
 
-namespace {
-
-// The point number of an element, read in place (no copy), or null for a
-// type that has none.
-inline const CString* PointNumber(const void* p, unsigned int code) {
-    if (code < 1001 || code > 1007 || !p) return nullptr;
-    const ElementOps* ops = ElementOpsFor(code);
-    return ops && ops->np ? ops->np(p) : nullptr;
-}
-
-}  // namespace
+using carnet_query::PointNumber;
 
 int CCarnet::Find(unsigned int type, const CString& np, int first, int end) const {
     const bool any = np.IsEmpty();
