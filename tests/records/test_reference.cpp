@@ -69,23 +69,3 @@ TEST(Reference, AbsentColumnsFollowTheReferenceCounts) {
                               Blanks(14) + " " + Blanks(4) + " x");
     EXPECT_EQ(ParamsOf(m), "AH =  54.3210000000");
 }
-
-TEST(Reference, PrintAndWriteNumberTheLine) {
-    CMesure m("M1", 54.321, "");
-    CNorvexTxtWnd w;
-    m.Print(&w, 3);
-    m.Print(nullptr, 3);
-    m.Print(&w, 0);
-    ASSERT_EQ(w.Texts().size(), 2u);
-    EXPECT_EQ(w.Texts()[0], "000003  " + InfosOf(m));
-    EXPECT_EQ(w.Texts()[1], InfosOf(m));
-
-    std::FILE* f = std::tmpfile();
-    ASSERT_NE(f, nullptr);
-    m.Write(f, 12);
-    std::rewind(f);
-    std::string text;
-    for (int c; (c = std::fgetc(f)) != EOF;) text += static_cast<char>(c);
-    std::fclose(f);
-    EXPECT_EQ(text, "000012  " + InfosOf(m) + "\n");
-}

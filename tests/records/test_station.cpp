@@ -96,9 +96,6 @@ TEST(Appareil, DisplayText) {
     EXPECT_EQ(ParamsOf(noCv), "C0 = 0.0000 , PH = 0.00500 , PV = 0.00500 , PD = 0.0500 + 5.0 ppm");
     EXPECT_EQ(ParamsOf(named),
               "TC 1200 , CV = -0.00120 , C0 = 0.0175 , PH = 0.00030 , PV = 0.00030 , PD = 0.0010 + 1.5 ppm");
-    named.SetCstePrism(0.01749);
-    EXPECT_EQ(named.FormCstePrism(), 0.0175);
-    EXPECT_EQ(named.CstePrism(), 0.01749);
 }
 
 TEST(Appareil, FileLine) {
