@@ -59,5 +59,7 @@ void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int&
 
 // The record branches (types 1000 to 1010); null when no element was made.
 void* ReadRecordLine(ReadContext& ctx, unsigned int code);
+// Traverse-path lines, new paths and continuations.
+void* ReadPath(ReadContext& ctx);
 
 }  // namespace carnet_reader

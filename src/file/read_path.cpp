@@ -1,0 +1,30 @@
+// Traverse-path lines: a path written over several lines is rebuilt as one
+// element when its lines follow each other.
+#include <carnet/chemin.h>
+
+#include "file/reader_internal.h"
+
+namespace carnet_reader {
+
+void* ReadPath(ReadContext& ctx) {
+    CCarnet& book = ctx.book;
+    const size_t n = ctx.WordCount();
+    if (!book.isEmpty() && book.typLast() == 1007 && book.ptrLast()) {
+        auto* last = static_cast<CChemin*>(const_cast<void*>(static_cast<const CCarnet&>(book).ptrLast()));
+        if (n >= 1 && last->Np().str() == ctx.cut.words[0]) {
+            if (n < 2) return ctx.Incomplete();
+            for (size_t i = 1; i < n; ++i) last->add(ctx.Word(i));
+            // No new element: the loader's increment is made up for here.
+            --ctx.index;
+            return last;
+        }
+    }
+    if (n < 3) return ctx.Incomplete();
+    auto* path = new CChemin(ctx.Word(0));
+    path->setAntenne(ctx.cut.keyword == CarnetTypeInfo(1007)->keywords[1] ? 0 : 1);
+    for (size_t i = 1; i < n; ++i) path->add(ctx.Word(i));
+    book.append(path, 1007);
+    return path;
+}
+
+}  // namespace carnet_reader

@@ -1,0 +1,174 @@
+// The record branches of the line reader: one small reader per survey record
+// keyword, each checking its word count and building the element.
+#include <string>
+
+#include <carnet/comment.h>
+#include <carnet/lecture.h>
+#include <carnet/numconv.h>
+#include <carnet/point.h>
+#include <carnet/reference.h>
+#include <carnet/station.h>
+
+#include "core/line_internal.h"
+#include "file/reader_internal.h"
+
+namespace carnet_reader {
+namespace {
+
+// A symbol word: every "***" stands for a blank.
+CString SymbolWord(const ReadContext& ctx, size_t i) {
+    CString s = ctx.Word(i);
+    carnet_line::UnmarkSpaces(s);
+    return s;
+}
+
+bool HasDot(std::string_view w) { return w.find('.') != std::string_view::npos; }
+
+// A coordinate word of a Point line: one optional sign, a decimal point, and
+// a text that prints back exactly with as many decimals as it has.
+bool IsCoordinate(std::string_view w) {
+    if (!w.empty() && (w[0] == '+' || w[0] == '-')) w.remove_prefix(1);
+    const size_t dot = w.find('.');
+    if (dot == std::string_view::npos) return false;
+    const int decimals = static_cast<int>(w.size() - dot - 1);
+    return numconv::Format("%.*f", decimals, numconv::Atof(w)) == w;
+}
+
+void* ReadText(ReadContext& ctx, unsigned int code) {
+    if (ctx.cut.rest.empty()) return ctx.Incomplete();
+    CString text{std::string(ctx.cut.rest)};
+    if (code == 1000) return ctx.Store(new CComment(text), code);
+    return ctx.Store(new CCommand(text), code);
+}
+
+void* ReadAppareil(ReadContext& ctx) {
+    if (ctx.WordCount() < 7) return ctx.Incomplete();
+    std::string name;
+    for (size_t i = 6; i < ctx.WordCount(); ++i) {
+        if (i > 6) name += ' ';
+        name += ctx.cut.words[i];
+    }
+    return ctx.Store(new CAppareil(CString(std::move(name)), ctx.Number(0), ctx.Number(1), ctx.Number(2),
+                                   ctx.Number(3), ctx.Number(4), ctx.Number(5)),
+                     1008);
+}
+
+void* ReadStation(ReadContext& ctx) {
+    const size_t n = ctx.WordCount();
+    if (n < 2 || n > 4) return ctx.Incomplete();
+    double v0 = n >= 3 ? ctx.Number(2) : UNDEF_VALUE;
+    // The writer marks an absent orientation as -1: read it back as absent,
+    // so a station saved without orientation loads as the same station.
+    if (v0 == -1.0) v0 = UNDEF_VALUE;
+    return ctx.Store(new CStation(ctx.Word(0), ctx.Number(1), v0, n == 4 ? SymbolWord(ctx, 3) : CString()), 1001);
+}
+
+void* ReadObservation(ReadContext& ctx, unsigned int code) {
+    const size_t n = ctx.WordCount();
+    CReference* r = nullptr;
+    auto make = [code](auto&&... args) -> CReference* {
+        if (code == 1003) return new CMesure(args...);
+        return new CReference(args...);
+    };
+    switch (n) {
+        case 2: r = make(ctx.Word(0), ctx.Number(1), CString()); break;
+        case 3: r = make(ctx.Word(0), ctx.Number(1), SymbolWord(ctx, 2)); break;
+        case 5: r = make(ctx.Word(0), ctx.Number(1), ctx.Number(2), ctx.Number(3), ctx.Number(4), CString()); break;
+        case 6:
+            r = make(ctx.Word(0), ctx.Number(1), ctx.Number(2), ctx.Number(3), ctx.Number(4), SymbolWord(ctx, 5));
+            break;
+        default: return ctx.Incomplete();
+    }
+    return ctx.Store(r, code);
+}
+
+void* ReadPoint(ReadContext& ctx) {
+    const size_t n = ctx.WordCount();
+    if (n < 2) return ctx.Incomplete();
+    size_t next = 1;
+    int lock = 0;
+    if (ctx.cut.words[1].size() == 1) {
+        lock = numconv::Atoi(std::string(ctx.cut.words[1]).c_str()) & 3;
+        next = 2;
+    }
+    double coords[3];
+    int count = 0;
+    std::string symbol;
+    for (size_t i = next; i < n; ++i) {
+        std::string_view w = ctx.cut.words[i];
+        if (count < 3 && IsCoordinate(w)) {
+            coords[count++] = numconv::Atof(w);
+        } else {
+            if (!symbol.empty()) symbol += ' ';
+            symbol += w;
+        }
+    }
+    if (count == 0) {
+        if (!(lock & 2)) return ctx.Incomplete();
+        lock = 2;
+    } else if (count == 1) {
+        lock &= 2;
+    }
+    CString sy(std::move(symbol));
+    carnet_line::UnmarkSpaces(sy);
+    CPointGen* p = nullptr;
+    switch (count) {
+        case 0: p = new CPointGen(ctx.Word(0), UNDEF_VALUE, sy); break;
+        case 1: p = new CPointGen(ctx.Word(0), coords[0], sy); break;
+        case 2: p = new CPointGen(ctx.Word(0), coords[0], coords[1], sy); break;
+        default: p = new CPointGen(ctx.Word(0), coords[0], coords[1], coords[2], sy); break;
+    }
+    p->m_bXConst = (lock & 1) ? 1 : 0;
+    p->m_bZConst = (lock & 2) ? 1 : 0;
+    return ctx.Store(p, 1006);
+}
+
+template <class Reading>
+void* ReadLevelling(ReadContext& ctx, unsigned int code) {
+    const size_t n = ctx.WordCount();
+    if (n < 2 || n > 4) return ctx.Incomplete();
+    double values[2];
+    int count = 0;
+    CString sy;
+    for (size_t i = 1; i < n; ++i) {
+        std::string_view w = ctx.cut.words[i];
+        // Words 2 and 3 are values when they hold a point; word 4 only while
+        // fewer than two values were found. Any other word replaces the symbol.
+        if (HasDot(w) && (i < 3 || count < 2)) {
+            values[count++] = numconv::Atof(w);
+        } else {
+            sy = SymbolWord(ctx, i);
+        }
+    }
+    if (count == 0) return ctx.Incomplete();
+    return ctx.Store(new Reading(ctx.Word(0), values[0], count == 2 ? values[1] : UNDEF_VALUE, sy), code);
+}
+
+void* ReadExcent(ReadContext& ctx) {
+    if (ctx.WordCount() != 1) return ctx.Incomplete();
+    const CarnetElementType* row = CarnetTypeInfo(1010);
+    int kind = 0;
+    while (kind < 2 && ctx.cut.keyword != row->keywords[kind]) ++kind;
+    return ctx.Store(new CExcent(kind, ctx.Number(0)), 1010);
+}
+
+}  // namespace
+
+void* ReadRecordLine(ReadContext& ctx, unsigned int code) {
+    switch (code) {
+        case 1000:
+        case 1009: return ReadText(ctx, code);
+        case 1001: return ReadStation(ctx);
+        case 1002:
+        case 1003: return ReadObservation(ctx, code);
+        case 1004: return ReadLevelling<CLectAR>(ctx, code);
+        case 1005: return ReadLevelling<CLectAV>(ctx, code);
+        case 1006: return ReadPoint(ctx);
+        case 1007: return ReadPath(ctx);
+        case 1008: return ReadAppareil(ctx);
+        case 1010: return ReadExcent(ctx);
+        default: return ctx.Incorrect();
+    }
+}
+
+}  // namespace carnet_reader
