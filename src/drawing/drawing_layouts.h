@@ -65,8 +65,8 @@ enum Option : unsigned int {
     // given (absent number, empty text, count not above 0); otherwise they are
     // always written, an absent number as -999999.000.
     kOmitAbsent = 1u << 0,
-    // setVal takes a new m_Val1 only when it differs by more than 1e-6 (the
-    // stair widths, which the host recomputes and rounds).
+    // setVal takes a new m_Val1 (a stair width) only when it differs by more
+    // than 1e-6.
     kTolerant = 1u << 1,
     // The number item of the display text is shown only after the text item.
     kNested = 1u << 2,

@@ -133,22 +133,27 @@ std::vector<TextCase> TextCases() {
         Case(CSymComp3("SC3", 1.5), L("Sym_Comp_3", "SC3  1.500  " + absent), "Code = SC3 , Ech 2 = 1.500"),
         Case(CPerpenSegm("PS", 1.5, 2.0), L("Perp_Segment", "PS  1.500  2.000"),
              "Code = PS , " + kDeport + " = 1.500 , Prolongement = 2.000"),
-        Case(CPerpenSegm("PS", 1.5, U), L("Perp_Segment", "PS  1.500  " + absent), "Code = PS , " + kDeport + " = 1.500"),
+        Case(CPerpenSegm("PS", 1.5, U), L("Perp_Segment", "PS  1.500  " + absent),
+             "Code = PS , " + kDeport + " = 1.500"),
         Case(CPerpenSegm("PS", U, 2.0), L("Perp_Segment", "PS  " + absent + "  2.000"), "Code = PS"),
         Case(CProlonSegm("PRS", 3.0, 0.25), L("Prol_Segment", "PRS  3.000  0.250"),
              "Code = PRS , Prolongement = 3.000 , " + kDeport + " = 0.250"),
-        Case(CProlonSegm("PRS", 3.0, U), L("Prol_Segment", "PRS  3.000  " + absent), "Code = PRS , Prolongement = 3.000"),
+        Case(CProlonSegm("PRS", 3.0, U), L("Prol_Segment", "PRS  3.000  " + absent),
+             "Code = PRS , Prolongement = 3.000"),
         Case(CIntersSegm("IS", 0.1, 0.2), L("Inter_Segment", "IS  0.100  0.200"),
              "Code = IS , " + kDecalage + " 1 = 0.100 , " + kDecalage + " 2 = 0.200"),
-        Case(CIntersSegm("IS", 0.1), L("Inter_Segment", "IS  0.100  " + absent), "Code = IS , " + kDecalage + " 1 = 0.100"),
-        Case(CInterDist("ID", 5.0, 6.0), L("Inter_Dist", "ID  5.000  6.000"), "Code = ID , Distance1 = 5.000 , Distance2 = 6.000"),
+        Case(CIntersSegm("IS", 0.1), L("Inter_Segment", "IS  0.100  " + absent),
+             "Code = IS , " + kDecalage + " 1 = 0.100"),
+        Case(CInterDist("ID", 5.0, 6.0), L("Inter_Dist", "ID  5.000  6.000"),
+             "Code = ID , Distance1 = 5.000 , Distance2 = 6.000"),
         Case(CInterDist("ID", 5.0, U), L("Inter_Dist", "ID  5.000  " + absent), "Code = ID"),
         Case(CInterDist("ID", U, 6.0), L("Inter_Dist", "ID  " + absent + "  6.000"), "Code = ID"),
 
         // Three numbers: one blank only before the third.
         Case(CSymEntree("SE", 1.0, 2.0, 0.3), L(kSymEntree, "SE  1.000  2.000 0.300"),
              "Code = SE , Ech X = 1.000 , Ech Y = 2.000 , Seuil = 0.300"),
-        Case(CSymEntree("SE", 1.0, 2.0), L(kSymEntree, "SE  1.000  2.000 " + absent), "Code = SE , Ech X = 1.000 , Ech Y = 2.000"),
+        Case(CSymEntree("SE", 1.0, 2.0), L(kSymEntree, "SE  1.000  2.000 " + absent),
+             "Code = SE , Ech X = 1.000 , Ech Y = 2.000"),
         Case(CSymEntree("SE", 1.0), L(kSymEntree, "SE  1.000  " + absent + " " + absent), "Code = SE , Ech = 1.000"),
         Case(CSymEntree("SE", 1.0, U, 0.3), L(kSymEntree, "SE  1.000  " + absent + " 0.300"),
              "Code = SE , Ech X = 1.000 , Ech Y = " + absent + " , Seuil = 0.300"),
@@ -171,14 +176,16 @@ std::vector<TextCase> TextCases() {
         Case(CEscalier2("E2", 4, U), L("Escalier_2", "E2  4"), "Code = E2 , Marches = 4"),
 
         // A linked line and a number.
-        Case(CCer1PtR("CER", "L12", 2.5), L("Cercle_R", "CER  L12  2.500"), "Code = CER , Liaison = L12 , Rayon = 2.500"),
+        Case(CCer1PtR("CER", "L12", 2.5), L("Cercle_R", "CER  L12  2.500"),
+             "Code = CER , Liaison = L12 , Rayon = 2.500"),
         Case(CCer1PtR("CER", "", 2.5), L("Cercle_R", "CER"), "Code = CER , Rayon = 2.500"),
         Case(CCer1PtR("CER", "L12"), L("Cercle_R", "CER  L12  " + absent), "Code = CER , Liaison = L12"),
         Case(CCer1PtR("CER"), L("Cercle_R", "CER"), "Code = CER"),
         Case(CCer1PtD("CED", "L1", 5.0), L("Cercle_D", "CED  L1  5.000"),
              "Code = CED , Liaison = L1 , " + kDiametre + " = 5.000"),
         Case(CCer1PtD("CED", "", 5.0), L("Cercle_D", "CED"), "Code = CED , " + kDiametre + " = 5.000"),
-        Case(CCarre2Pt("CAR", "L2", 1.0), L(kCarre2Pts, "CAR  L2  1.000"), "Code = CAR , Liaison = L2 , " + kCote + " = 1.000"),
+        Case(CCarre2Pt("CAR", "L2", 1.0), L(kCarre2Pts, "CAR  L2  1.000"),
+             "Code = CAR , Liaison = L2 , " + kCote + " = 1.000"),
         Case(CCarre2Pt("CAR", "", 1.0), L(kCarre2Pts, "CAR"), "Code = CAR , " + kCote + " = 1.000"),
         Case(CParallele("PAR", "L1", 1.5), L(kParallele, "PAR  L1  1.500"),
              "Code = PAR , Liaison = L1 , " + kDecalage + " = 1.500"),
@@ -306,7 +313,8 @@ TEST(DrawingLines, ABookOfEveryKindListsWritesCopiesAndFreesThem) {
     book.append(new CEscalier4("another long code for the heap check", "a long linked line name", 3, 0.5), 1051);
 
     std::string listing;
-    for (int i = 0; i < 55; ++i) listing += numconv::Format("%06d  ", i + 1) + typical[static_cast<size_t>(i)]->line + "\n";
+    for (int i = 0; i < 55; ++i)
+        listing += numconv::Format("%06d  ", i + 1) + typical[static_cast<size_t>(i)]->line + "\n";
 
     CNorvexTxtWnd wnd;
     book.Print(&wnd, 1);
