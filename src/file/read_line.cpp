@@ -104,7 +104,11 @@ void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int&
     }
     const auto& keywords = Keywords();
     auto it = keywords.find(ctx.cut.keyword);
-    if (it == keywords.end()) return ctx.Incorrect();
+    if (it == keywords.end()) {
+        // Option lines only come from a whole file, never while appending.
+        if (!bAppend && ReadOptionLine(ctx)) return nullptr;
+        return ctx.Incorrect();
+    }
     const unsigned int code = it->second;
     if (code < CARNET_FIRST_DRAWING_TYPE) return ReadRecordLine(ctx, code);
     // Drawing-command lines are not read yet: reported like any unknown keyword.

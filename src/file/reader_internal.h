@@ -61,5 +61,8 @@ void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int&
 void* ReadRecordLine(ReadContext& ctx, unsigned int code);
 // Traverse-path lines, new paths and continuations.
 void* ReadPath(ReadContext& ctx);
+// Option lines: their values go to the stored parameters, never to the
+// book. False when the keyword is not an option keyword.
+bool ReadOptionLine(ReadContext& ctx);
 
 }  // namespace carnet_reader
