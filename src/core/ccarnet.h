@@ -151,6 +151,10 @@ public:
     CPointGen* validPoint(CNorvexTxtWnd* pWnd, CPointGen* p, int line);
     void validComment(const char* fmt, const CString& a, const CString& b);
 
+    // ---- Comment and object conversion ----
+    void changeObjectIntoComment(CNorvexTxtWnd* pWnd, int i);
+    void changeCommentIntoObject(CNorvexTxtWnd* pWnd, int i);
+
     // ---- Saving, backup and options ----
     int Save(const CString& fileName, CWnd* pParent, bool bAppend);
     int FileSave(const CString& initialName);

@@ -35,6 +35,12 @@ struct HasFileKeyword : std::false_type {};
 template <class T>
 struct HasFileKeyword<T, std::void_t<decltype(std::declval<const T&>().FileKeyword())>> : std::true_type {};
 
+template <class T, class = void>
+struct HasLineInfos : std::false_type {};
+template <class T>
+struct HasLineInfos<T, std::void_t<decltype(std::declval<T&>().Infos(std::declval<CString&>()))>>
+    : std::true_type {};
+
 template <class T>
 ElementOps MakeOps() {
     ElementOps ops{};
@@ -54,6 +60,8 @@ ElementOps MakeOps() {
             ops.np = [](const void* p) -> const CString* { return &static_cast<const T*>(p)->Np(); };
         if constexpr (HasSy<T>::value)
             ops.sy = [](const void* p) -> const CString* { return &static_cast<const T*>(p)->Sy(); };
+        if constexpr (HasLineInfos<T>::value)
+            ops.infos = [](void* p, CString& out) { static_cast<T*>(p)->Infos(out); };
         if constexpr (HasFileKeyword<T>::value)
             ops.keyword = [](const void* p) -> const char* { return static_cast<const T*>(p)->FileKeyword(); };
     }

@@ -17,6 +17,7 @@ struct ElementOps {
     const CString* (*np)(const void* p);       // null: the type has no point number
     const CString* (*sy)(const void* p);       // null: the type has no code
     const char* (*keyword)(const void* p);     // null: the table's keyword
+    void (*infos)(void* p, CString& out);      // null: no one-line file text
 };
 
 // The operations of a type code, or null for a code outside the table or a
