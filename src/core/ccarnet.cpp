@@ -39,13 +39,7 @@ CCarnet& CCarnet::removeAt(int i, int bDelete) {
 
 CCarnet& CCarnet::removeAll(int bDelete) {
     // Last to first, each entry out of the list before it is destroyed.
-    for (int i = length() - 1; i >= 0; --i) {
-        void* p = m_Elements.GetAt(i);
-        unsigned int t = m_Types.GetAt(i);
-        m_Elements.RemoveAt(i);
-        m_Types.RemoveAt(i);
-        if (bDelete) removeElement(p, t);
-    }
+    for (int i = length() - 1; i >= 0; --i) removeAt(i, bDelete);
     return *this;
 }
 
