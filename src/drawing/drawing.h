@@ -92,7 +92,8 @@ class CAlignement : public carnet_drawing::OneValueCommand<CAlignement, carnet_d
     using Layout::Layout;
 };
 class CEscalier5 : public carnet_drawing::OneValueCommand<CEscalier5, carnet_drawing::kLargeurMarche,
-                                                          carnet_drawing::kOmitAbsent | carnet_drawing::kTolerant,
+                                                          carnet_drawing::kOmitAbsent | carnet_drawing::kTolerant |
+                                                              carnet_drawing::kCodeDropsSign,
                                                           2> {
     using Layout::Layout;
 };
@@ -103,8 +104,8 @@ class CSymetric : public carnet_drawing::OneValueCommand<CSymetric, carnet_drawi
     using Layout::Layout;
 };
 
-// ---- L3: m_Code, m_Val1, m_Val2. Arguments: labels of m_Val1 and m_Val2, label of m_Val1 shown alone, fewest
-// constructor arguments.
+// ---- L3: m_Code, m_Val1, m_Val2. Arguments: labels of m_Val1 and m_Val2, label of m_Val1 shown alone, options,
+// fewest constructor arguments.
 
 class CSymSansOri : public carnet_drawing::TwoValueCommand<CSymSansOri, carnet_drawing::kEchX, carnet_drawing::kEchY,
                                                            carnet_drawing::kEchX> {
@@ -127,12 +128,12 @@ class CSymComp3 : public carnet_drawing::TwoValueCommand<CSymComp3, carnet_drawi
     using Layout::Layout;
 };
 class CPerpenSegm : public carnet_drawing::TwoValueCommand<CPerpenSegm, carnet_drawing::kDeport,
-                                                           carnet_drawing::kProlongement, carnet_drawing::kDeport,
+                                                           carnet_drawing::kProlongement, carnet_drawing::kDeport, 0,
                                                            3> {
     using Layout::Layout;
 };
 class CProlonSegm : public carnet_drawing::TwoValueCommand<CProlonSegm, carnet_drawing::kProlongement,
-                                                           carnet_drawing::kDeport, carnet_drawing::kProlongement,
+                                                           carnet_drawing::kDeport, carnet_drawing::kProlongement, 0,
                                                            3> {
     using Layout::Layout;
 };
@@ -141,7 +142,8 @@ class CIntersSegm : public carnet_drawing::TwoValueCommand<CIntersSegm, carnet_d
     using Layout::Layout;
 };
 class CInterDist : public carnet_drawing::TwoValueCommand<CInterDist, carnet_drawing::kDistance1,
-                                                          carnet_drawing::kDistance2, carnet_drawing::kNoLabel, 3> {
+                                                          carnet_drawing::kDistance2, carnet_drawing::kNoLabel,
+                                                          carnet_drawing::kNeedsValues, 3> {
     using Layout::Layout;
 };
 
@@ -202,23 +204,28 @@ class CCarreDia : public carnet_drawing::TextCommand<CCarreDia, carnet_drawing::
                                                      1> {
     using Layout::Layout;
 };
-class CTexte : public carnet_drawing::TextCommand<CTexte, carnet_drawing::kTexte, carnet_drawing::kQuoted> {
+class CTexte : public carnet_drawing::TextCommand<CTexte, carnet_drawing::kTexte,
+                                                  carnet_drawing::kQuoted | carnet_drawing::kFreeText> {
     using Layout::Layout;
 };
 class CTexteOrient : public carnet_drawing::TextCommand<CTexteOrient, carnet_drawing::kTexte,
-                                                        carnet_drawing::kQuoted> {
+                                                        carnet_drawing::kQuoted | carnet_drawing::kFreeText> {
     using Layout::Layout;
 };
-class CAddAttSy : public carnet_drawing::TextCommand<CAddAttSy, carnet_drawing::kTexte, carnet_drawing::kQuoted> {
+class CAddAttSy : public carnet_drawing::TextCommand<CAddAttSy, carnet_drawing::kTexte,
+                                                     carnet_drawing::kQuoted | carnet_drawing::kFreeText> {
     using Layout::Layout;
 };
-class CAddAttPt : public carnet_drawing::TextCommand<CAddAttPt, carnet_drawing::kTexte, carnet_drawing::kQuoted> {
+class CAddAttPt : public carnet_drawing::TextCommand<CAddAttPt, carnet_drawing::kTexte,
+                                                     carnet_drawing::kQuoted | carnet_drawing::kFreeText> {
     using Layout::Layout;
 };
-class CAccrProLi : public carnet_drawing::TextCommand<CAccrProLi, carnet_drawing::kLiaison> {
+class CAccrProLi : public carnet_drawing::TextCommand<CAccrProLi, carnet_drawing::kLiaison,
+                                                     carnet_drawing::kNeedsText> {
     using Layout::Layout;
 };
-class CRappelPoint : public carnet_drawing::TextCommand<CRappelPoint, carnet_drawing::kPoint> {
+class CRappelPoint : public carnet_drawing::TextCommand<CRappelPoint, carnet_drawing::kPoint,
+                                                       carnet_drawing::kNeedsText> {
     using Layout::Layout;
 };
 

@@ -11,6 +11,9 @@
 #include <tuple>
 #include <type_traits>
 
+#include <string>
+
+#include <carnet/code.h>
 #include <carnet/cstring.h>
 #include <carnet/element_types.h>
 #include <carnet/txtwnd.h>
@@ -72,6 +75,16 @@ enum Option : unsigned int {
     kNested = 1u << 2,
     // The display text shows the text between '<' and '>'.
     kQuoted = 1u << 3,
+    // A free text of several words: a file line gives it all that follows the
+    // code; Interprete joins every token after the code into it.
+    kFreeText = 1u << 4,
+    // Interprete cuts the separator after the code even in sign mode, so a
+    // sign there is lost.
+    kCodeDropsSign = 1u << 5,
+    // Interprete succeeds only when every number was typed.
+    kNeedsValues = 1u << 6,
+    // Interprete succeeds only when the text was typed.
+    kNeedsText = 1u << 7,
 };
 
 const char* LabelText(Label label);
@@ -103,6 +116,36 @@ inline bool AnyChanged(std::initializer_list<bool> changes) {
         if (c) return true;
     return false;
 }
+
+// A code string typed by the user, cut into tokens one member after the
+// other. The separator "\xB1" is the sign mode: a token ends before the first
+// '+' or '-' (none when the text starts with '-'). With `keep`, that sign
+// stays in front of the next token; otherwise, and always outside sign mode,
+// one character (the sign, or the first one of the separator) is dropped.
+// A separator at the very start of the text does not cut it.
+class TypedCode {
+public:
+    // `code` gives the implied decimals of the numbers; none without an entry.
+    TypedCode(const CString& text, const CString& sep, const CCode* code = nullptr);
+
+    bool AtEnd() const { return m_Rest.empty(); }
+    // The next token as it stands (empty at the end).
+    CString Text(bool keep);
+    // The next token read as an integer; 0 (not typed) gives -1.
+    int Count(bool keep);
+    // The next token, with the sign in front of it in sign mode, read as a
+    // number and divided by 10 to the implied decimals; 0 (not typed) and a
+    // number beyond the double range give UNDEF_VALUE.
+    double Number(bool keep);
+
+private:
+    std::string Token(bool keep);
+
+    std::string m_Rest;
+    std::string m_Sep;
+    bool m_bSign;
+    double m_Scale;
+};
 
 // Enables the value constructors taking `args` arguments when a class has
 // them: some classes lack the shorter ones.
@@ -147,6 +190,12 @@ public:
 
     void Params(CString& out) const { BeginParams(out, m_Code); }
     void Infos(CString& out) const { BeginLine(out, this->kType, m_Code); }
+
+    bool Interprete(CString text, CString sep) {
+        TypedCode typed(text, sep);
+        m_Code = typed.Text(true);
+        return !m_Code.IsEmpty();
+    }
 };
 
 // L2: m_Code, m_Val1. Options: kOmitAbsent, kTolerant.
@@ -176,11 +225,19 @@ public:
         BeginLine(out, this->kType, m_Code);
         if (!(kOptions & kOmitAbsent) || Given(m_Val1)) out.AppendFormat("  %.3f", m_Val1);
     }
+
+    bool Interprete(CString text, CString sep, const CCode* code) {
+        TypedCode typed(text, sep, code);
+        m_Code = typed.Text(!(kOptions & kCodeDropsSign));
+        m_Val1 = typed.Number(true);
+        return !m_Code.IsEmpty();
+    }
 };
 
 // L3: m_Code, m_Val1, m_Val2. The display shows both values under kLabel1 and
-// kLabel2 when m_Val2 is given, else m_Val1 alone under kAlone.
-template <class Self, Label kLabel1, Label kLabel2, Label kAlone, int kMinArgs = 1>
+// kLabel2 when m_Val2 is given, else m_Val1 alone under kAlone. Options:
+// kNeedsValues.
+template <class Self, Label kLabel1, Label kLabel2, Label kAlone, unsigned int kOptions = 0, int kMinArgs = 1>
 class TwoValueCommand : public CommandOutput<Self> {
 public:
     using Layout = TwoValueCommand;  // lets a command class inherit the constructors
@@ -210,6 +267,14 @@ public:
     void Infos(CString& out) const {
         BeginLine(out, this->kType, m_Code);
         out.AppendFormat("  %.3f  %.3f", m_Val1, m_Val2);
+    }
+
+    bool Interprete(CString text, CString sep, const CCode* code) {
+        TypedCode typed(text, sep, code);
+        m_Code = typed.Text(true);
+        m_Val1 = typed.Number(true);
+        m_Val2 = typed.Number(true);
+        return !m_Code.IsEmpty() && (!(kOptions & kNeedsValues) || (Given(m_Val1) && Given(m_Val2)));
     }
 };
 
@@ -248,6 +313,16 @@ public:
         BeginLine(out, this->kType, m_Code);
         out.AppendFormat("  %.3f  %.3f %.3f", m_Val1, m_Val2, m_Val3);
     }
+
+    // Every number keeps its sign, as in L3.
+    bool Interprete(CString text, CString sep, const CCode* code) {
+        TypedCode typed(text, sep, code);
+        m_Code = typed.Text(true);
+        m_Val1 = typed.Number(true);
+        m_Val2 = typed.Number(true);
+        m_Val3 = typed.Number(true);
+        return !m_Code.IsEmpty();
+    }
 };
 
 // L5: m_Code, m_Num. With kOmitAbsent the count is shown and written only when
@@ -273,6 +348,13 @@ public:
     void Infos(CString& out) const {
         BeginLine(out, this->kType, m_Code);
         if (!(kOptions & kOmitAbsent) || m_Num > 0) out.AppendFormat("  %d", m_Num);
+    }
+
+    bool Interprete(CString text, CString sep) {
+        TypedCode typed(text, sep);
+        m_Code = typed.Text(false);
+        m_Num = typed.Count(true);
+        return !m_Code.IsEmpty();
     }
 };
 
@@ -311,6 +393,14 @@ public:
             out.AppendFormat("  %d  %.3f", m_Num, m_Val1);
         else if (m_Num > 0)
             out.AppendFormat("  %d", m_Num);
+    }
+
+    bool Interprete(CString text, CString sep, const CCode* code) {
+        TypedCode typed(text, sep, code);
+        m_Code = typed.Text(false);
+        m_Num = typed.Count(true);
+        m_Val1 = typed.Number(true);
+        return !m_Code.IsEmpty();
     }
 };
 
@@ -351,10 +441,18 @@ public:
         if (!(kOptions & kOmitAbsent) || !m_Text.IsEmpty())
             out.AppendFormat("  %s  %.3f", m_Text.GetString(), m_Val1);
     }
+
+    bool Interprete(CString text, CString sep, const CCode* code) {
+        TypedCode typed(text, sep, code);
+        m_Code = typed.Text(false);
+        m_Text = typed.Text(true);
+        m_Val1 = typed.Number(true);
+        return !m_Code.IsEmpty();
+    }
 };
 
 // L8: m_Code, m_Text. With kOmitAbsent an empty text is not written; kQuoted
-// shows the text between '<' and '>'.
+// shows the text between '<' and '>'. Options: kFreeText, kNeedsText.
 template <class Self, Label kLabel, unsigned int kOptions = 0, int kMinArgs = 2>
 class TextCommand : public CommandOutput<Self> {
 public:
@@ -380,6 +478,18 @@ public:
     void Infos(CString& out) const {
         BeginLine(out, this->kType, m_Code);
         if (!(kOptions & kOmitAbsent) || !m_Text.IsEmpty()) out.AppendFormat("  %s", m_Text.GetString());
+    }
+
+    bool Interprete(CString text, CString sep) {
+        TypedCode typed(text, sep);
+        m_Code = typed.Text(false);
+        if (kOptions & kFreeText) {
+            m_Text.Empty();
+            while (!typed.AtEnd()) m_Text += typed.Text(false);
+        } else {
+            m_Text = typed.Text(true);
+        }
+        return !m_Code.IsEmpty() && (!(kOptions & kNeedsText) || !m_Text.IsEmpty());
     }
 };
 
@@ -418,6 +528,15 @@ public:
     void Infos(CString& out) const {
         BeginLine(out, this->kType, m_Code);
         if (!m_Text.IsEmpty()) out.AppendFormat("  %s  %.3f  %.3f", m_Text.GetString(), m_Val1, m_Val2);
+    }
+
+    bool Interprete(CString text, CString sep, const CCode* code) {
+        TypedCode typed(text, sep, code);
+        m_Code = typed.Text(false);
+        m_Text = typed.Text(true);
+        m_Val1 = typed.Number(true);
+        m_Val2 = typed.Number(true);
+        return !m_Code.IsEmpty();
     }
 };
 
@@ -463,6 +582,15 @@ public:
             out.AppendFormat("  %s  %d", m_Text.GetString(), m_Num);
         else if (m_Text != "-1")
             out.AppendFormat("  %s", m_Text.GetString());
+    }
+
+    bool Interprete(CString text, CString sep, const CCode* code) {
+        TypedCode typed(text, sep, code);
+        m_Code = typed.Text(false);
+        m_Text = typed.Text(false);
+        m_Num = typed.Count(true);
+        m_Val1 = typed.Number(true);
+        return !m_Code.IsEmpty();
     }
 };
 

@@ -111,8 +111,7 @@ void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int&
     }
     const unsigned int code = it->second;
     if (code < CARNET_FIRST_DRAWING_TYPE) return ReadRecordLine(ctx, code);
-    // Drawing-command lines are not read yet: reported like any unknown keyword.
-    return ctx.Incorrect();
+    return ReadDrawingLine(ctx, code);
 }
 
 }  // namespace carnet_reader

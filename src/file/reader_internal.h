@@ -59,6 +59,9 @@ void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int&
 
 // The record branches (types 1000 to 1010); null when no element was made.
 void* ReadRecordLine(ReadContext& ctx, unsigned int code);
+// The drawing-command branches (types 1011 to 1065); null when no command
+// was made.
+void* ReadDrawingLine(ReadContext& ctx, unsigned int code);
 // Traverse-path lines, new paths and continuations.
 void* ReadPath(ReadContext& ctx);
 // Option lines: their values go to the stored parameters, never to the
