@@ -22,7 +22,8 @@ build: deps
 	cmake --build --preset release -j $(JOBS)
 
 run: build
-	./build/release/bin/carnet --help
+	./build/release/bin/carnet check examples/chantier.geo
+	./build/release/bin/carnet list --numbers examples/chantier.geo
 
 test: test-release test-asan
 
