@@ -37,5 +37,13 @@ test-asan: deps
 	cmake --build --preset asan -j $(JOBS)
 	ctest --preset asan -j $(JOBS)
 
+# Benchmarks against the cost of merely reading and writing the same bytes,
+# then their ratios; never part of `make test`.
+bench: deps
+	cmake --preset bench >/dev/null
+	cmake --build --preset bench -j $(JOBS) --target carnet_bench
+	./build/bench/bin/carnet_bench --benchmark_repetitions=3 --benchmark_out=build/bench/results.json --benchmark_out_format=json
+	python3 bench/ratios.py build/bench/results.json
+
 clean:
 	rm -rf build
