@@ -153,9 +153,7 @@ void StoreTolerances(const ReadContext& ctx) {
 }
 
 void StoreOlderNetwork(const ReadContext& ctx) {
-    OptionStore store(ctx, kTolerances);
-    store.Text("TypeTolerance", ctx.Word(0));
-    store.Text("TypeCanevas", ctx.Word(1));
+    OptionStore(ctx, kTolerances).Words({"TypeTolerance", "TypeCanevas"});
 }
 
 // The older tolerances line gives every tolerance in thousandths.

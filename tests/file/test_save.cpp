@@ -1,6 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -185,30 +184,21 @@ TEST_F(Save, TheDialogChoosesTheNameOrCancels) {
     EXPECT_EQ(Entries(Dir()), (std::vector<std::string>{"choisi", "source.geo"}));
 }
 
-TEST_F(Save, ARefusedPathShowsTheWarningAndCreatesNothing) {
+TEST_F(Save, ARefusedPathOrAFullDiskShowsTheWarningAndCreatesNothing) {
     CCarnet book;
     LoadText(book, "Station S1 1.5\n");
     book.m_FileName = Path("source.geo");
     WriteFile(Path("plain"), "x");
-    const std::string refused[] = {Path("absent/chantier.geo"), Path("plain/chantier.geo"), Dir()};
-    for (const std::string& path : refused) {
+    for (const std::string& path : {Path("absent/chantier.geo"), Path("plain/chantier.geo"), Dir(),
+                                    std::string("/dev/full")}) {
         m_boxes.boxes.clear();
         EXPECT_EQ(book.Save(path, nullptr, false), 0) << path;
         EXPECT_EQ(book.Save(path, nullptr, true), 0) << path;
         EXPECT_EQ(book.m_FileName, Path("source.geo"));
-        EXPECT_EQ(m_boxes.boxes, std::vector<std::string>(2, "|Impossible d'enregistrer la Sitebook sous\n" + path + " !"));
+        const std::string warning = "|Impossible d'enregistrer la Sitebook sous\n" + path + " !";
+        EXPECT_EQ(m_boxes.boxes, std::vector<std::string>(2, warning));
     }
     EXPECT_EQ(Entries(Dir()), (std::vector<std::string>{"plain", "source.geo"}));
-}
-
-TEST_F(Save, AFullDiskIsAFailedSave) {
-    CCarnet book;
-    LoadText(book, "Station S1 1.5\n");
-    book.m_FileName = Path("source.geo");
-    EXPECT_EQ(book.Save("/dev/full", nullptr, false), 0);
-    EXPECT_EQ(book.Save("/dev/full", nullptr, true), 0);
-    EXPECT_EQ(m_boxes.boxes.size(), 2u);
-    EXPECT_EQ(book.m_FileName, Path("source.geo"));
     // A device is written to, never replaced.
     EXPECT_EQ(book.Save("/dev/null", nullptr, false), 1);
     struct stat st;
@@ -286,33 +276,30 @@ TEST_F(Save, BackUpCopiesEveryByteBesideTheFile) {
     EXPECT_EQ(Entries(Dir()).size(), 6u);
 }
 
-TEST_F(Save, BackUpWithoutAFileDoesNothing) {
+TEST_F(Save, AFailedBackUpChangesNothing) {
     CCarnet book;
+    ::mkdir(Path("dossier.geo").c_str(), 0755);
     for (const std::string& name : {Path("absent.geo"), Path("dossier.geo"), std::string("")}) {
-        ::mkdir(Path("dossier.geo").c_str(), 0755);
         book.m_FileName = name;
         book.BackUp();
     }
-    // The backup name of a folder cannot be written: nothing happens either.
+    // A backup name that is a folder, or a write stopped halfway, leave the
+    // earlier backup as it was.
     WriteFile(Path("bloque.geo"), "texte\n");
     ::mkdir(Path("bloque.sbk").c_str(), 0755);
     book.m_FileName = Path("bloque.geo");
     book.BackUp();
-    EXPECT_EQ(Entries(Dir()), (std::vector<std::string>{"bloque.geo", "bloque.sbk", "dossier.geo"}));
-    EXPECT_TRUE(m_boxes.boxes.empty());
-}
-
-TEST_F(Save, AFailedBackUpKeepsThePreviousBackUp) {
-    CCarnet book;
-    book.m_FileName = Path("chantier.geo");
     const std::string older = "000001  Commentaire      ancienne copie\n";
     WriteFile(Path("chantier.sbk"), older);
+    book.m_FileName = Path("chantier.geo");
     WriteFile(book.m_FileName.str(), std::string(4000, 'y') + "\n");
-    const int status = WithFileSizeLimit(1000, [&] {
-        book.BackUp();
-        return 0;
-    });
-    EXPECT_EQ(status, 0);
+    EXPECT_EQ(WithFileSizeLimit(1000, [&] {
+                  book.BackUp();
+                  return 0;
+              }),
+              0);
     EXPECT_EQ(ReadFile(Path("chantier.sbk")), older);
-    EXPECT_EQ(Entries(Dir()), (std::vector<std::string>{"chantier.geo", "chantier.sbk"}));
+    EXPECT_EQ(Entries(Dir()), (std::vector<std::string>{"bloque.geo", "bloque.sbk", "chantier.geo", "chantier.sbk",
+                                                        "dossier.geo"}));
+    EXPECT_TRUE(m_boxes.boxes.empty());
 }

@@ -192,10 +192,6 @@ TEST_F(Tool, FormatTakesTheOptionsOfALocationWithoutChangingThem) {
     EXPECT_EQ(lines[0], "        Option_Correc                       0  0.0  0.0  0.000  0.000  0.000  6366.000");
     EXPECT_EQ(lines[1], "        Option_Projec                       Projection Lambert Zone IV");
     EXPECT_EQ(ReadFile(profile), settings);
-    // The registry form: nothing stored there gives the defaults.
-    run = Carnet("format --params HKEY_CURRENT_USER\\\\Software\\\\Carnet " + book);
-    EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(Lines(ReadFile(book))[1], "        Option_Projec                       Aucune");
     EXPECT_EQ(Entries(Dir()), (std::vector<std::string>{"err.txt", "out.txt", "params.ini", "work"}));
 }
 
