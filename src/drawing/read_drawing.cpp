@@ -33,60 +33,60 @@ constexpr FieldRule kNeeds2Quiet{2, 3, true, false};
 
 // In type order, from 1011.
 constexpr FieldRule kRules[] = {
-    kAtLeast1,               // 1011 PT_Sans_Ori
-    kAtLeast1,               // 1012 PT_Avec_Ori
-    kAtLeast1,               // 1013 Def_Ori_PT
-    kAtLeast1,               // 1014 Annul_Ori_PT
-    kAtLeast1,               // 1015 Def_Ori_SY
-    kAtLeast1,               // 1016 Annul_Ori_SY
-    kUpTo3,                  // 1017 Sym_sans_Ori
-    kUpTo2,                  // 1018 Sym_Cir_Ray
-    kUpTo2,                  // 1019 Sym_Cir_Dia
-    kAtLeast1,               // 1020 Sym_Cir_3Pt
-    kUpTo3,                  // 1021 Sym_Oriente
-    kUpTo2,                  // 1022 Sym_Ori_EX
-    kAtLeast1,               // 1023 Sym_Car_Dia
-    kAtLeast1,               // 1024 Sym_Fixe_2Pt
-    kUpTo2,                  // 1025 Sym_2Pts
-    kUpTo2,                  // 1026 Sym_2Pt_EX
-    kUpTo2,                  // 1027 Sym_2Pt_EY
-    kUpTo3,                  // 1028 Sym_3Pts_H
-    kUpTo3,                  // 1029 Sym_3Pts_D
-    kUpTo2,                  // 1030 Sym_Comp_1
-    kUpTo2,                  // 1031 Sym_Comp_2
-    kUpTo3,                  // 1032 Sym_Comp_3
-    kUpTo4,                  // 1033 Sym_Entree
-    {2, 2, false, false},    // 1034 Sym_Aligne: the count is required
-    kUpTo3,                  // 1035 Cercle_R
-    kUpTo3,                  // 1036 Cercle_D
-    {1, 2, false, true},     // 1037 Cercle_3Pts
-    {1, 2, false, true},     // 1038 Carre_Dia
-    kUpTo3,                  // 1039 Carre_2Pts
-    kUpTo4,                  // 1040 Rect_3Pts_H
-    kUpTo4,                  // 1041 Rect_3Pts_D
-    kUpTo2,                  // 1042 Liaison
-    kNeeds2Quiet,            // 1043 Perp_Segment
-    kUpTo2,                  // 1044 Alignement
-    kNeeds2Quiet,            // 1045 Prol_Segment
-    kUpTo3,                  // 1046 Inter_Segment
-    kNeeds2Quiet,            // 1047 Parallele
-    kUpTo2,                  // 1048 Escalier_1
-    kUpTo3,                  // 1049 Escalier_2
-    kUpTo2,                  // 1050 Escalier_3
-    kUpTo4,                  // 1051 Escalier_4
-    kUpTo2,                  // 1052 Escalier_5
-    {1, 1, false, false},    // 1053 Passage_Pieton
-    {1, 1, false, false},    // 1054 Passage_Velo
-    kAtLeast1,               // 1055 Texte_1Pt (free text)
-    kAtLeast1,               // 1056 Texte_Oriente (free text)
-    kAtLeast1,               // 1057 Cache_Attrib
-    kAtLeast1,               // 1058 Ajout_Attrib (free text)
-    kAtLeast1,               // 1059 Attrib_Point (free text)
-    kAtLeast1,               // 1060 Accro_Pt_Pro
+    kAtLeast1,                    // 1011 PT_Sans_Ori
+    kAtLeast1,                    // 1012 PT_Avec_Ori
+    kAtLeast1,                    // 1013 Def_Ori_PT
+    kAtLeast1,                    // 1014 Annul_Ori_PT
+    kAtLeast1,                    // 1015 Def_Ori_SY
+    kAtLeast1,                    // 1016 Annul_Ori_SY
+    kUpTo3,                       // 1017 Sym_sans_Ori
+    kUpTo2,                       // 1018 Sym_Cir_Ray
+    kUpTo2,                       // 1019 Sym_Cir_Dia
+    kAtLeast1,                    // 1020 Sym_Cir_3Pt
+    kUpTo3,                       // 1021 Sym_Oriente
+    kUpTo2,                       // 1022 Sym_Ori_EX
+    kAtLeast1,                    // 1023 Sym_Car_Dia
+    kAtLeast1,                    // 1024 Sym_Fixe_2Pt
+    kUpTo2,                       // 1025 Sym_2Pts
+    kUpTo2,                       // 1026 Sym_2Pt_EX
+    kUpTo2,                       // 1027 Sym_2Pt_EY
+    kUpTo3,                       // 1028 Sym_3Pts_H
+    kUpTo3,                       // 1029 Sym_3Pts_D
+    kUpTo2,                       // 1030 Sym_Comp_1
+    kUpTo2,                       // 1031 Sym_Comp_2
+    kUpTo3,                       // 1032 Sym_Comp_3
+    kUpTo4,                       // 1033 Sym_Entree
+    {2, 2, false, false},         // 1034 Sym_Aligne: the count is required
+    kUpTo3,                       // 1035 Cercle_R
+    kUpTo3,                       // 1036 Cercle_D
+    {1, 2, false, true},          // 1037 Cercle_3Pts
+    {1, 2, false, true},          // 1038 Carre_Dia
+    kUpTo3,                       // 1039 Carre_2Pts
+    kUpTo4,                       // 1040 Rect_3Pts_H
+    kUpTo4,                       // 1041 Rect_3Pts_D
+    kUpTo2,                       // 1042 Liaison
+    kNeeds2Quiet,                 // 1043 Perp_Segment
+    kUpTo2,                       // 1044 Alignement
+    kNeeds2Quiet,                 // 1045 Prol_Segment
+    kUpTo3,                       // 1046 Inter_Segment
+    kNeeds2Quiet,                 // 1047 Parallele
+    kUpTo2,                       // 1048 Escalier_1
+    kUpTo3,                       // 1049 Escalier_2
+    kUpTo2,                       // 1050 Escalier_3
+    kUpTo4,                       // 1051 Escalier_4
+    kUpTo2,                       // 1052 Escalier_5
+    {1, 1, false, false},         // 1053 Passage_Pieton
+    {1, 1, false, false},         // 1054 Passage_Velo
+    kAtLeast1,                    // 1055 Texte_1Pt (free text)
+    kAtLeast1,                    // 1056 Texte_Oriente (free text)
+    kAtLeast1,                    // 1057 Cache_Attrib
+    kAtLeast1,                    // 1058 Ajout_Attrib (free text)
+    kAtLeast1,                    // 1059 Attrib_Point (free text)
+    kAtLeast1,                    // 1060 Accro_Pt_Pro
     {2, kNoLimit, false, false},  // 1061 Accro_Li_Pro
     {2, kNoLimit, false, false},  // 1062 Rappel_Point
-    kAtLeast1,               // 1063 Perp_2Pts
-    kAtLeast1,               // 1064 Symetrique
+    kAtLeast1,                    // 1063 Perp_2Pts
+    kAtLeast1,                    // 1064 Symetrique
     {3, kNoLimit, false, false},  // 1065 Inter_Dist
 };
 static_assert(sizeof kRules / sizeof kRules[0] == CARNET_LAST_TYPE - CARNET_FIRST_DRAWING_TYPE + 1,
