@@ -64,8 +64,8 @@ double TypedCode::Number(bool keep) {
     }
     number += Token(keep);
     const double value = numconv::Atof(number) / m_Scale;
-    // Too many digits, or a decimal count far out of range, would leave an
-    // infinity or NaN that no line could write back: not a number then.
+    // A decimal count far out of range would leave an infinity or NaN that
+    // no line could write back: not a number then.
     if (value == 0.0 || !std::isfinite(value)) return UNDEF_VALUE;
     return value;
 }
