@@ -1,6 +1,7 @@
 // Saving a field book and keeping a backup of its previous file. Whatever
-// goes wrong, the file on disk is either the old one or the complete new one:
-// the new bytes are prepared in memory and replace the file as a whole.
+// goes wrong, a file on disk is either the old one or the complete new one:
+// the new bytes are prepared in memory and replace the file as a whole
+// (a device or a pipe, which cannot be replaced, is written to instead).
 #include <sys/stat.h>
 
 #include <cerrno>
