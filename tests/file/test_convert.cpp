@@ -2,6 +2,8 @@
 
 #include <carnet/carnet.h>
 
+#include "save_fixture.h"
+
 namespace {
 
 // A small book: a station, a reference, a point, a path, a comment.
@@ -97,4 +99,18 @@ TEST_F(ConvertBook, PathLineInACommentKeepsTheComment) {
     EXPECT_EQ(book.parAt(4), "CheminEncadre C9 A-1 B-1");
     ASSERT_EQ(book.length(), 6);
     EXPECT_EQ(book.typAt(5), 1007u);
+}
+
+class ConvertOptions : public save_test::BookFileTest {};
+
+TEST_F(ConvertOptions, OptionLineInACommentGoesToTheStore) {
+    CCarnet book;
+    book.m_ParamFile = Path("params.ini").c_str();
+    book.append(new CComment("Option_Projec Projection Lambert Zone II"), 1000);
+    void* comment = book.ptrAt(0);
+    book.changeCommentIntoObject(nullptr, 0);
+    EXPECT_EQ(book.ptrAt(0), comment);  // no element made: the comment stays
+    CString stored;
+    GetParamString(book.m_ParamFile, "Options_Corrections", "Projection", "Aucune", &stored);
+    EXPECT_EQ(stored, "Projection Lambert Zone II");
 }
