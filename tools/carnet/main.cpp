@@ -1,15 +1,10 @@
 // carnet: command-line access to land-surveying field books.
 //
-// Exit status of every command: 0 when all went well, 1 when lines of a
-// book were rejected, 2 when a file could not be read or written.
-#include <sys/stat.h>
-
-#include <algorithm>
-#include <cerrno>
+// Exit status of every command: 0 when all went well, 1 when lines of a book
+// were rejected or an input was refused, 2 when a file could not be read or
+// written or the command line was wrong.
 #include <cstdio>
 #include <cstring>
-#include <fstream>
-#include <iterator>
 #include <string>
 #include <vector>
 
@@ -17,164 +12,164 @@
 
 #include <carnet/carnet.h>
 
-#include "terminal.h"
+#include "commands.h"
+#include "session.h"
 
 namespace {
 
-using carnet_tool::Encoding;
-using carnet_tool::ScratchStore;
-using carnet_tool::StreamWnd;
+using namespace carnet_tool;
 
-constexpr int kOk = 0;
-constexpr int kRejected = 1;
-constexpr int kUnreadable = 2;
+const char kVersion[] =
+    "carnet 0.1.0\n"
+    "This tool is free software under the GNU General Public License, version 2 or\n"
+    "later: it is built with dxflib, which is under that license. The carnet\n"
+    "library itself is under the MIT license. There is NO WARRANTY.";
 
-Encoding g_encoding = Encoding::Cp1252;
+const char kFooter[] =
+    "Field books are code page 1252 files; --encoding says how to read them (auto:\n"
+    "as UTF-8 when they are valid UTF-8 with characters beyond ASCII). Texts are\n"
+    "shown as UTF-8 when the locale says so (--output-encoding). Files are saved\n"
+    "in code page 1252; a character that it cannot hold stops the command and\n"
+    "nothing is written.\n"
+    "\n"
+    "Examples:\n"
+    "  carnet check chantier.geo                 carnet list -n chantier.geo\n"
+    "  carnet show chantier.geo --type Point     carnet find chantier.geo S1\n"
+    "  carnet next chantier.geo --type Mesure    carnet select chantier.geo '101-105'\n"
+    "  carnet export chantier.geo --to svg -o chantier.svg\n"
+    "\n"
+    "Exit status: 0 when all went well; 1 when lines of a book were rejected or\n"
+    "an input was refused; 2 when a file could not be read or written, or the\n"
+    "command line was wrong.";
 
-// The tool's own messages, on standard error.
-void Say(const std::string& text) {
-    std::fflush(stdout);
-    std::string line = "carnet: " + carnet_tool::ForOutput(text, g_encoding) + "\n";
-    std::fwrite(line.data(), 1, line.size(), stderr);
+Encoding EncodingNamed(const std::string& name) {
+    if (name == "cp1252") return Encoding::Cp1252;
+    if (name == "utf-8" || name == "utf8") return Encoding::Utf8;
+    return Encoding::Auto;
 }
 
-std::string Plural(int n, const char* word) {
-    return std::to_string(n) + " " + word + (n == 1 ? "" : "s");
-}
-
-// Whether the file can be opened for reading, with the reason when not; the
-// library would only say that it cannot.
-bool Readable(const std::string& path) {
-    std::FILE* f = std::fopen(path.c_str(), "rb");
-    if (!f) {
-        Say("cannot read " + path + ": " + std::strerror(errno));
-        return false;
-    }
-    struct stat st;
-    const bool folder = ::fstat(fileno(f), &st) == 0 && S_ISDIR(st.st_mode);
-    std::fclose(f);
-    if (folder) Say("cannot read " + path + ": " + std::strerror(EISDIR));
-    return !folder;
-}
-
-// Loads a book, its diagnostics on standard error, each after the file's
-// name. Its option lines go to the scratch store.
-int LoadBook(const std::string& path, const ScratchStore& store, CCarnet& book, int& rejected) {
-    rejected = 0;
-    if (!Readable(path)) return kUnreadable;
-    StreamWnd diagnostics(stderr, g_encoding, path + ": ");
-    std::fflush(stdout);
-    book.Load(&diagnostics, path, store.Location(), 0, nullptr);
-    rejected = diagnostics.Rejected();
-    return rejected > 0 ? kRejected : kOk;
-}
-
-int Check(const std::vector<std::string>& files, const ScratchStore& store) {
-    int status = kOk;
-    for (const std::string& path : files) {
-        CCarnet book;
-        int rejected = 0;
-        const int result = LoadBook(path, store, book, rejected);
-        status = std::max(status, result);
-        if (result == kUnreadable)
-            std::printf("%s: not read\n", path.c_str());
-        else
-            std::printf("%s: %s loaded, %s rejected\n", path.c_str(), Plural(book.length(), "element").c_str(),
-                        Plural(rejected, "line").c_str());
-        std::fflush(stdout);
-    }
-    return status;
-}
-
-int List(const std::string& path, bool numbers, const ScratchStore& store) {
-    CCarnet book;
-    int rejected = 0;
-    const int status = LoadBook(path, store, book, rejected);
-    if (status == kUnreadable) return status;
-    StreamWnd listing(stdout, g_encoding);
-    book.Print(&listing, numbers ? 1 : 0);
-    return status;
-}
-
-std::string Contents(const std::string& path) {
-    std::ifstream in(path, std::ios::binary);
-    return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
-
-// The library's backup says nothing when it fails; here a failed backup
-// must stop the save that would overwrite the only copy.
-bool BackUpDone(CCarnet& book) {
-    const std::string target = book.m_FileName.str();
-    struct stat st;
-    if (::stat(target.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return true;  // nothing to keep
-    book.BackUp();
-    const std::string backup = target.size() < 3 ? "sbk" : target.substr(0, target.size() - 3) + "sbk";
-    if (Contents(backup) == Contents(target)) return true;
-    Say("cannot back up " + target + " to " + backup + "; nothing written");
-    return false;
-}
-
-int Format(const std::string& path, const std::string& output, bool backup, const std::string& params,
-           const ScratchStore& store) {
-    CCarnet book;
-    int rejected = 0;
-    const int status = LoadBook(path, store, book, rejected);
-    if (status == kUnreadable) return status;
-    if (rejected > 0) {
-        Say(path + ": " + Plural(rejected, "line") + " rejected; nothing written, they would be lost");
-        return kRejected;
-    }
-    const std::string target = output.empty() ? path : output;
-    book.m_FileName = target;
-    if (backup && !BackUpDone(book)) return kUnreadable;
-    if (!params.empty()) book.m_ParamFile = params;
-    return book.Save(target, nullptr, false) ? kOk : kUnreadable;
+CLI::App* Subcommand(CLI::App& app, const char* name, const char* what, const char* example) {
+    CLI::App* sub = app.add_subcommand(name, what);
+    sub->footer(std::string("Example:\n  ") + example);
+    return sub;
 }
 
 }  // namespace
 
 int main(int argc, char** argv) {
-    CLI::App app{"carnet: inspect and maintain land-surveying field books (.geo files)"};
-    app.set_version_flag("--version", "carnet 0.1.0");
+    CLI::App app{"carnet: inspect, query, convert and export land-surveying field books (.geo files)"};
+    app.set_version_flag("--version", kVersion);
     app.require_subcommand(0, 1);
     app.fallthrough();
-    app.footer("Exit status: 0 when all went well, 1 when lines of a book were rejected,\n"
-               "2 when a file could not be read or written.");
-    std::string encoding = "auto";
-    app.add_option("--encoding", encoding,
-                   "Output texts as the file's code page 1252 bytes (cp1252) or as UTF-8 (utf8); "
-                   "auto follows the locale")
-        ->check(CLI::IsMember({"auto", "cp1252", "utf8"}))
+    app.footer(kFooter);
+    const auto encodings = CLI::IsMember({"auto", "cp1252", "utf-8", "utf8"});
+    std::string input = "auto", output = "auto";
+    app.add_option("--encoding", input, "Encoding of the books and tables read")
+        ->check(encodings)
+        ->capture_default_str();
+    app.add_option("--output-encoding", output, "Encoding of the texts shown; auto follows the locale")
+        ->check(encodings)
         ->capture_default_str();
 
-    std::vector<std::string> checkFiles;
-    CLI::App* check = app.add_subcommand("check", "Load each book, report every rejected line and sum up");
-    check->add_option("files", checkFiles, "Field-book files")->required();
+    std::vector<std::string> files;
+    std::string file, type, name, text, target, params, format;
+    bool numbers = false, json = false, backup = false, list = false;
+    int version = CCode::CurrentVersion, decimals = 0;
+    std::string sep = "/";
 
-    std::string listFile;
-    bool numbers = false;
-    CLI::App* list = app.add_subcommand("list", "Print the lines of a book");
-    list->add_option("file", listFile, "Field-book file")->required();
-    list->add_flag("-n,--numbers", numbers, "Number the lines as a saved file does");
+    CLI::App* check = Subcommand(app, "check", "Load each book, report every rejected line and sum up",
+                                 "carnet check chantier.geo other.geo");
+    check->add_option("files", files, "Field-book files")->required();
 
-    std::string formatFile, output, params;
-    bool backup = false;
-    CLI::App* format = app.add_subcommand(
-        "format", "Load a book and save it again in the standard layout, its options first");
-    format->add_option("file", formatFile, "Field-book file")->required();
-    format->add_option("-o,--output", output, "Write here instead of over the file");
-    format->add_flag("--backup", backup, "Copy the file to be overwritten to its .sbk backup first");
-    format->add_option("--params", params,
-                       "Write the options stored at this parameter location (a profile file or a "
-                       "registry key) instead of the book's own");
+    CLI::App* listing = Subcommand(app, "list", "Print the lines of a book", "carnet list --numbers chantier.geo");
+    listing->add_option("file", file, "Field-book file")->required();
+    listing->add_flag("-n,--numbers", numbers, "Number the lines as a saved file does");
 
-    CLI11_PARSE(app, argc, argv);
+    CLI::App* show = Subcommand(app, "show",
+                                "One row per element: position, keyword, point number, code, display text",
+                                "carnet show chantier.geo --type Station --json");
+    show->add_option("file", file, "Field-book file")->required();
+    show->add_option("--type", type, "Only the elements of this type (a code such as 1006, or a keyword)");
+    show->add_flag("--json", json, "A JSON array of objects instead of columns");
 
-    g_encoding = encoding == "utf8"     ? Encoding::Utf8
-                 : encoding == "cp1252" ? Encoding::Cp1252
-                                        : carnet_tool::EncodingOfLocale();
-    SetMessageBoxHandler([](CWnd*, const char* text, const char*, unsigned int flags) {
-        Say(text);
+    CLI::App* find = Subcommand(app, "find", "The elements that bear a point number, and the point's coordinates",
+                                "carnet find chantier.geo S3");
+    find->add_option("file", file, "Field-book file")->required();
+    find->add_option("number", name, "Point number")->required();
+
+    CLI::App* next = Subcommand(app, "next", "The next point number to use",
+                                "carnet next chantier.geo --type Mesure");
+    next->add_option("file", file, "Field-book file")->required();
+    next->add_option("--type", type, "After the last number of this type (a code or a keyword); any type by default");
+
+    CLI::App* select = Subcommand(app, "select",
+                                  "Check and rewrite a selection string, count its point numbers, show what matches",
+                                  "carnet select chantier.geo '105-101;S*'");
+    select->add_option("file", file, "Field-book file")->required();
+    select->add_option("selection", text, "Selection string, such as 1-5;8;P.1-P.20;A.*")->required();
+
+    CLI::App* codes = Subcommand(app, "codes",
+                                 "Rewrite a code table in the current format, upgrading an older one",
+                                 "carnet codes old-table.txt --version 3 -o table.txt");
+    codes->add_option("table", file, "Code-table file, one entry a line")->required();
+    codes->add_option("--version", version, "Format version of the table read (0 to 5)")
+        ->required()
+        ->check(CLI::Range(0, CCode::CurrentVersion));
+    codes->add_option("-o,--output", target, "Write here (code page 1252) instead of showing it");
+
+    CLI::App* interpret = Subcommand(app, "interpret",
+                                     "Build a drawing command from a typed code: its file line and display text",
+                                     "carnet interpret Sym_sans_Ori 'ARB+150-075' --sep '\xC2\xB1' --decimals 2");
+    interpret->add_option("keyword", name, "Drawing keyword (such as Cercle_R) or its type code (1011 to 1065)");
+    interpret->add_option("code", text, "The typed code, such as CER/L12/250");
+    interpret->add_option("--sep", sep, "Separator between the fields; \xC2\xB1 splits before each sign")
+        ->capture_default_str();
+    interpret->add_option("--decimals", decimals, "Implied decimals of the typed numbers")->capture_default_str();
+    interpret->add_flag("--list", list, "List the drawing keywords and their codes");
+
+    CLI::App* options = Subcommand(app, "options", "Print the option lines of a parameter location",
+                                   "carnet options --params HKEY_CURRENT_USER\\\\Software\\\\Carnet");
+    options->add_option("--params", params,
+                        "A profile file, or a registry key such as HKEY_CURRENT_USER\\Software\\Carnet; the "
+                        "defaults without it");
+
+    CLI::App* projection = Subcommand(app, "projection", "Print the projection a book declares",
+                                      "carnet projection chantier.geo");
+    projection->add_option("file", file, "Field-book file")->required();
+
+    CLI::App* formatting = Subcommand(app, "format",
+                                      "Load a book and save it again in the standard layout, its options first",
+                                      "carnet format --backup chantier.geo");
+    formatting->add_option("file", file, "Field-book file")->required();
+    formatting->add_option("-o,--output", target, "Write here instead of over the file");
+    formatting->add_flag("--backup", backup, "Copy the file to be overwritten to its .sbk backup first");
+    formatting->add_option("--params", params,
+                           "Write the options stored at this parameter location (a profile file or a registry "
+                           "key) instead of the book's own");
+
+    CLI::App* exporting = Subcommand(app, "export",
+                                     "The points with known coordinates and the traverse paths, for other programs",
+                                     "carnet export chantier.geo --to geojson -o chantier.geojson");
+    exporting->add_option("file", file, "Field-book file")->required();
+    exporting->add_option("--to", format, "csv (points), geojson, dxf or svg (an A4 plot)")
+        ->required()
+        ->check(CLI::IsMember({"csv", "geojson", "dxf", "svg"}));
+    exporting->add_option("-o,--output", target, "Write here instead of standard output");
+
+    try {
+        app.parse(argc, argv);
+    } catch (const CLI::Success& e) {
+        return app.exit(e);  // --help, --version
+    } catch (const CLI::ParseError& e) {
+        std::fprintf(stderr, "carnet: %s\ncarnet --help tells how to use it\n", e.what());
+        return kUnreadable;
+    }
+
+    Session& session = CurrentSession();
+    session.input = EncodingNamed(input);
+    session.output = EncodingNamed(output) == Encoding::Auto ? EncodingOfLocale() : EncodingNamed(output);
+    SetMessageBoxHandler([](CWnd*, const char* message, const char*, unsigned int flags) {
+        Say(CurrentSession().context, message);
         return (flags & MB_YESNO) ? IDNO : IDOK;
     });
 
@@ -182,12 +177,27 @@ int main(int argc, char** argv) {
         std::printf("%s", app.help().c_str());
         return kOk;
     }
-    ScratchStore store;
-    if (!store.IsReady()) {
-        Say(std::string("cannot create a temporary folder: ") + std::strerror(errno));
+    if (!session.store.IsReady()) {
+        Say("carnet", std::string("cannot create a temporary folder: ") + std::strerror(errno));
         return kUnreadable;
     }
-    if (check->parsed()) return Check(checkFiles, store);
-    if (list->parsed()) return List(listFile, numbers, store);
-    return Format(formatFile, output, backup, params, store);
+    if (check->parsed()) return Check(files);
+    if (listing->parsed()) return List(file, numbers);
+    if (show->parsed()) return Show(file, type, json);
+    if (find->parsed()) return Find(file, name);
+    if (next->parsed()) return Next(file, type);
+    if (select->parsed()) return Select(file, text);
+    if (codes->parsed()) return Codes(file, version, target);
+    if (interpret->parsed()) {
+        if (list) return ListDrawingKeywords();
+        if (name.empty() || text.empty()) {
+            Say("carnet", "interpret needs a keyword and a code, or --list");
+            return kUnreadable;
+        }
+        return Interpret(name, text, sep, decimals);
+    }
+    if (options->parsed()) return Options(params);
+    if (projection->parsed()) return ShowProjection(file);
+    if (exporting->parsed()) return Export(file, format, target);
+    return Format(file, target, backup, params);
 }

@@ -1,37 +1,80 @@
 #include "terminal.h"
 
+#include <iconv.h>
 #include <langinfo.h>
 #include <unistd.h>
 
+#include <algorithm>
+#include <cerrno>
 #include <clocale>
 #include <cstdlib>
 #include <cstring>
+#include <filesystem>
 
 namespace carnet_tool {
 namespace {
 
-// Code points of the bytes 0x80 to 0x9F; the five bytes that code page 1252
-// leaves unassigned become the replacement character.
-const char32_t kHighControls[32] = {
-    0x20AC, 0xFFFD, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
-    0x2039, 0x0152, 0xFFFD, 0x017D, 0xFFFD, 0xFFFD, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
-    0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0xFFFD, 0x017E, 0x0178,
+const char kRejectedMark[] = "Erreur ligne ";
+const char kReplacement[] = "\xEF\xBF\xBD";
+
+// One conversion descriptor per direction, opened once: a listing converts
+// every line it prints.
+class Converter {
+public:
+    Converter(const char* to, const char* from) : m_cd(::iconv_open(to, from)) {
+        if (m_cd == reinterpret_cast<iconv_t>(-1)) {
+            std::fprintf(stderr, "carnet: the C library cannot convert from %s to %s\n", from, to);
+            std::exit(2);
+        }
+    }
+    ~Converter() { ::iconv_close(m_cd); }
+    Converter(const Converter&) = delete;
+    Converter& operator=(const Converter&) = delete;
+
+    // Converts as far as it can; returns the number of input bytes used.
+    // `error` is 0 when the whole text was converted, else the errno.
+    size_t Run(std::string_view in, std::string& out, int& error) {
+        ::iconv(m_cd, nullptr, nullptr, nullptr, nullptr);
+        char* src = const_cast<char*>(in.data());
+        size_t left = in.size();
+        error = 0;
+        char chunk[256];
+        while (left > 0) {
+            char* dst = chunk;
+            size_t room = sizeof chunk;
+            const size_t done = ::iconv(m_cd, &src, &left, &dst, &room);
+            out.append(chunk, static_cast<size_t>(dst - chunk));
+            if (done == static_cast<size_t>(-1) && errno != E2BIG) {
+                error = errno;
+                break;
+            }
+        }
+        return in.size() - left;
+    }
+
+private:
+    iconv_t m_cd;
 };
 
-void AppendUtf8(std::string& out, char32_t c) {
-    if (c < 0x80) {
-        out += static_cast<char>(c);
-    } else if (c < 0x800) {
-        out += static_cast<char>(0xC0 | (c >> 6));
-        out += static_cast<char>(0x80 | (c & 0x3F));
-    } else {
-        out += static_cast<char>(0xE0 | (c >> 12));
-        out += static_cast<char>(0x80 | ((c >> 6) & 0x3F));
-        out += static_cast<char>(0x80 | (c & 0x3F));
-    }
+Converter& ToUtf8() {
+    static Converter converter("UTF-8", "CP1252");
+    return converter;
 }
 
-const char kRejectedMark[] = "Erreur ligne ";
+Converter& ToCp1252() {
+    static Converter converter("CP1252", "UTF-8");
+    return converter;
+}
+
+// Length of the UTF-8 sequence that starts with this byte, 0 for a byte that
+// cannot start one.
+size_t SequenceLength(unsigned char c) {
+    if (c < 0x80) return 1;
+    if (c >= 0xC2 && c <= 0xDF) return 2;
+    if (c >= 0xE0 && c <= 0xEF) return 3;
+    if (c >= 0xF0 && c <= 0xF4) return 4;
+    return 0;
+}
 
 }  // namespace
 
@@ -44,15 +87,70 @@ Encoding EncodingOfLocale() {
     return encoding;
 }
 
-std::string ForOutput(std::string_view text, Encoding encoding) {
-    if (encoding == Encoding::Cp1252) return std::string(text);
+bool HasHighBytes(std::string_view text) {
+    for (char ch : text)
+        if (static_cast<unsigned char>(ch) >= 0x80) return true;
+    return false;
+}
+
+bool IsUtf8(std::string_view text, size_t& bad) {
+    for (size_t i = 0; i < text.size();) {
+        const unsigned char c = static_cast<unsigned char>(text[i]);
+        const size_t n = SequenceLength(c);
+        bool ok = n > 0 && i + n <= text.size();
+        for (size_t k = 1; ok && k < n; ++k) ok = (static_cast<unsigned char>(text[i + k]) & 0xC0) == 0x80;
+        if (ok && n >= 3) {
+            // No overlong forms, no surrogates, nothing beyond U+10FFFF.
+            const unsigned char d = static_cast<unsigned char>(text[i + 1]);
+            ok = !(c == 0xE0 && d < 0xA0) && !(c == 0xED && d >= 0xA0) && !(c == 0xF0 && d < 0x90) &&
+                 !(c == 0xF4 && d >= 0x90);
+        }
+        if (!ok) {
+            bad = i;
+            return false;
+        }
+        i += n;
+    }
+    return true;
+}
+
+std::string Utf8Of(std::string_view cp1252) {
+    if (!HasHighBytes(cp1252)) return std::string(cp1252);
     std::string out;
-    out.reserve(text.size() + text.size() / 8);
-    for (char ch : text) {
-        const unsigned char c = static_cast<unsigned char>(ch);
-        AppendUtf8(out, c >= 0x80 && c < 0xA0 ? kHighControls[c - 0x80] : c);
+    out.reserve(cp1252.size() + cp1252.size() / 4);
+    while (!cp1252.empty()) {
+        int error = 0;
+        const size_t used = ToUtf8().Run(cp1252, out, error);
+        cp1252.remove_prefix(used);
+        if (error == 0) break;
+        out += kReplacement;  // an unassigned byte
+        cp1252.remove_prefix(1);
     }
     return out;
+}
+
+bool Cp1252Of(std::string_view utf8, std::string& out, Unheld& unheld) {
+    out.clear();
+    if (!HasHighBytes(utf8)) {
+        out.assign(utf8);
+        return true;
+    }
+    int error = 0;
+    const size_t used = ToCp1252().Run(utf8, out, error);
+    if (error == 0) return true;
+    unheld.offset = used;
+    const size_t n = std::max<size_t>(1, SequenceLength(static_cast<unsigned char>(utf8[used])));
+    unheld.character.assign(utf8.substr(used, n));
+    const unsigned char lead = static_cast<unsigned char>(unheld.character[0]);
+    unsigned long cp = n == 1 ? lead : lead & (0x7F >> n);
+    for (size_t k = 1; k < unheld.character.size(); ++k)
+        cp = (cp << 6) | (static_cast<unsigned char>(unheld.character[k]) & 0x3F);
+    unheld.codePoint = cp;
+    return false;
+}
+
+std::string ForOutput(std::string_view text, Encoding encoding) {
+    return encoding == Encoding::Utf8 ? Utf8Of(text) : std::string(text);
 }
 
 void StreamWnd::Append(const std::string& text) {
@@ -74,8 +172,8 @@ ScratchStore::ScratchStore() {
 
 ScratchStore::~ScratchStore() {
     if (m_folder.empty()) return;
-    ::unlink(m_file.c_str());
-    ::rmdir(m_folder.c_str());
+    std::error_code ignored;
+    std::filesystem::remove_all(m_folder, ignored);
 }
 
 }  // namespace carnet_tool

@@ -1,6 +1,7 @@
-// The terminal side of the tool: the text window that streams to a terminal
-// or a pipe, the conversion of code-page-1252 texts for a UTF-8 terminal,
-// and a scratch parameter store that keeps the user's own store untouched.
+// The terminal side of the tool: the conversions between the code page 1252
+// of field books and UTF-8 (through iconv), the text window that streams to a
+// terminal or a pipe, and a scratch folder that keeps the user's own
+// parameter store untouched.
 #pragma once
 
 #include <cstdio>
@@ -14,12 +15,33 @@ namespace carnet_tool {
 enum class Encoding {
     Cp1252,  // the bytes of the field book, unchanged
     Utf8,
+    Auto,    // input only: UTF-8 when the bytes are valid UTF-8 with some above 127
 };
 
 // UTF-8 when the locale of the environment says so, else the file's bytes.
 Encoding EncodingOfLocale();
 
-// The text in the chosen encoding.
+// Code page 1252 text as UTF-8; the five bytes that code page 1252 leaves
+// unassigned become the replacement character.
+std::string Utf8Of(std::string_view cp1252);
+
+// Whether the text is valid UTF-8; `bad` gets the offset of the first byte
+// that is not.
+bool IsUtf8(std::string_view text, size_t& bad);
+bool HasHighBytes(std::string_view text);
+
+// A character that code page 1252 cannot hold, met while converting.
+struct Unheld {
+    size_t offset = 0;      // in the UTF-8 text
+    std::string character;  // its UTF-8 bytes
+    unsigned long codePoint = 0;
+};
+
+// UTF-8 text as code page 1252; false, with the character, when one has no
+// place in code page 1252. The text must be valid UTF-8.
+bool Cp1252Of(std::string_view utf8, std::string& out, Unheld& unheld);
+
+// The text in the chosen output encoding.
 std::string ForOutput(std::string_view text, Encoding encoding);
 
 // A text window that writes every text as a line to a stream as it comes,
@@ -42,9 +64,10 @@ private:
     int m_rejected = 0;
 };
 
-// A profile file in a fresh temporary folder, removed with it. Option lines
-// read from a book go there instead of the user's settings, and are written
-// back from there when the book is saved.
+// A fresh temporary folder, removed with all it holds. Option lines read from
+// a book go to a profile file there instead of the user's settings, and are
+// written back from there when the book is saved; books converted from UTF-8
+// and exports being written wait there too.
 class ScratchStore {
 public:
     ScratchStore();
@@ -54,6 +77,8 @@ public:
 
     bool IsReady() const { return !m_folder.empty(); }
     const std::string& Location() const { return m_file; }
+    // A path in the folder.
+    std::string PathOf(const std::string& name) const { return m_folder + "/" + name; }
 
 private:
     std::string m_folder;

@@ -1,0 +1,30 @@
+// The subcommands of the tool. Each returns the exit status.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace carnet_tool {
+
+constexpr unsigned int kAnyType = 999;  // the library's "every type"
+
+// inspect.cpp
+int Check(const std::vector<std::string>& files);
+int List(const std::string& path, bool numbers);
+int Show(const std::string& path, const std::string& type, bool json);
+int Find(const std::string& path, const std::string& name);
+int Next(const std::string& path, const std::string& type);
+int Select(const std::string& path, const std::string& selection);
+int Options(const std::string& location);
+int ShowProjection(const std::string& path);
+
+// convert.cpp
+int Format(const std::string& path, const std::string& output, bool backup, const std::string& params);
+int Codes(const std::string& table, int version, const std::string& output);
+int Interpret(const std::string& keyword, const std::string& text, const std::string& sep, int decimals);
+int ListDrawingKeywords();
+
+// export.cpp
+int Export(const std::string& path, const std::string& format, const std::string& output);
+
+}  // namespace carnet_tool

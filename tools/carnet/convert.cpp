@@ -1,0 +1,196 @@
+// The commands that rewrite: a book in the standard layout, a code table in
+// the current format, and a typed code as a drawing command.
+#include <sys/stat.h>
+
+#include <cstdio>
+#include <fstream>
+#include <iterator>
+#include <type_traits>
+#include <utility>
+
+#include <carnet/carnet.h>
+
+#include "commands.h"
+#include "session.h"
+
+namespace carnet_tool {
+namespace {
+
+void Put(const std::string& cp1252) {
+    const std::string text = ForOutput(cp1252, CurrentSession().output);
+    std::fwrite(text.data(), 1, text.size(), stdout);
+}
+
+std::string Contents(const std::string& path) {
+    std::ifstream in(path, std::ios::binary);
+    return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+}
+
+// The library's backup says nothing when it fails; here a failed backup
+// must stop the save that would overwrite the only copy.
+bool BackUpDone(CCarnet& book) {
+    const std::string target = book.m_FileName.str();
+    struct stat st;
+    if (::stat(target.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return true;  // nothing to keep
+    book.BackUp();
+    const std::string backup = target.size() < 3 ? "sbk" : target.substr(0, target.size() - 3) + "sbk";
+    if (Contents(backup) == Contents(target)) return true;
+    Say(target, "cannot back up to " + backup + "; nothing written");
+    return false;
+}
+
+// Why a code-table line cannot be converted, or nothing. The library takes
+// any line; a line without a code or with a kind that is not a whole number
+// would come out as an entry that nobody wrote.
+std::string Refusal(const std::string& line) {
+    const size_t first = line.find(';');
+    if (first == 0 || line.find_first_not_of(' ') == first) return "no code before the first \";\"";
+    if (first == std::string::npos) return "no kind after the code";
+    const size_t end = line.find(';', first + 1);
+    std::string kind = line.substr(first + 1, end == std::string::npos ? std::string::npos : end - first - 1);
+    const size_t digits = kind.find_first_not_of(' ');
+    if (digits == std::string::npos || kind.find_first_not_of("0123456789", digits) != std::string::npos)
+        return "the kind \"" + kind + "\" is not a whole number";
+    return std::string();
+}
+
+// Interpretation of a typed code by the class of a drawing keyword.
+struct Interpreted {
+    bool usable = false;
+    CString line;  // its file line
+    CString text;  // its display text
+};
+using InterpretFn = Interpreted (*)(const CString& text, const CString& sep, const CCode& entry);
+
+// The classes whose numbers take their implied decimals from a code-table entry.
+template <class T, class = void>
+struct TakesEntry : std::false_type {};
+template <class T>
+struct TakesEntry<T, std::void_t<decltype(std::declval<T&>().Interprete(CString(), CString(),
+                                                                         static_cast<const CCode*>(nullptr)))>>
+    : std::true_type {};
+
+template <class T>
+Interpreted InterpretAs(const CString& text, const CString& sep, const CCode& entry) {
+    T command;
+    Interpreted result;
+    if constexpr (TakesEntry<T>::value)
+        result.usable = command.Interprete(text, sep, &entry);
+    else
+        result.usable = command.Interprete(text, sep);
+    command.Infos(result.line);
+    command.Params(result.text);
+    return result;
+}
+
+// Only the drawing commands interpret typed codes; the survey records of the
+// table get no interpreter.
+template <unsigned int kCode, class T>
+constexpr InterpretFn InterpreterOf() {
+    if constexpr (kCode >= CARNET_FIRST_DRAWING_TYPE)
+        return &InterpretAs<T>;
+    else
+        return nullptr;
+}
+
+#define CARNET_TOOL_INTERPRETER(code, cls, ...) InterpreterOf<code, cls>(),
+constexpr InterpretFn kInterpreters[] = {CARNET_ELEMENT_TYPES(CARNET_TOOL_INTERPRETER)};
+#undef CARNET_TOOL_INTERPRETER
+
+// The drawing type of a keyword typed at the terminal (case ignored) or of
+// its code; 0 when none.
+unsigned int DrawingType(const std::string& keyword) {
+    const unsigned int code = static_cast<unsigned int>(numconv::Atoi(keyword.c_str()));
+    if (code >= CARNET_FIRST_DRAWING_TYPE && code <= CARNET_LAST_TYPE &&
+        keyword.find_first_not_of("0123456789") == std::string::npos)
+        return code;
+    for (unsigned int t = CARNET_FIRST_DRAWING_TYPE; t <= CARNET_LAST_TYPE; ++t)
+        if (cp1252::CompareNoCase(CarnetKeyword(t), keyword.c_str()) == 0) return t;
+    return 0;
+}
+
+}  // namespace
+
+int Format(const std::string& path, const std::string& output, bool backup, const std::string& params) {
+    CCarnet book;
+    int rejected = 0;
+    const int status = LoadBook(path, book, rejected);
+    if (status != kOk) return status;
+    const std::string target = output.empty() ? path : output;
+    CurrentSession().context = target;
+    book.m_FileName = target;
+    if (backup && !BackUpDone(book)) return kUnreadable;
+    if (!params.empty()) book.m_ParamFile = params;
+    return book.Save(target, nullptr, false) ? kOk : kUnreadable;
+}
+
+int Codes(const std::string& table, int version, const std::string& output) {
+    std::string bytes;
+    bool converted = false;
+    const int status = ReadInput(table, bytes, converted);
+    if (status != kOk) return status;
+    std::string written;
+    long refused = 0, number = 0;
+    for (size_t start = 0; start < bytes.size(); ++number) {
+        size_t end = bytes.find('\n', start);
+        if (end == std::string::npos) end = bytes.size();
+        std::string line = bytes.substr(start, end - start);
+        start = end + 1;
+        if (!line.empty() && line.back() == '\r') line.pop_back();
+        if (line.find_first_not_of(" \t") == std::string::npos) continue;
+        const std::string why = Refusal(line);
+        if (!why.empty()) {
+            Say(table + ":" + std::to_string(number + 1), "refused, " + why + ": " + line);
+            ++refused;
+            continue;
+        }
+        // A fresh entry each time: initCode keeps what the kind does not set.
+        CCode entry;
+        entry.initCode(line.c_str(), version);
+        CString converted_line;
+        entry.getTableLine(converted_line);
+        written += converted_line.str() + "\n";
+    }
+    if (refused > 0) {
+        Say(table, Plural(refused, "line") + " refused; nothing written, they would be lost");
+        return kRejected;
+    }
+    if (output.empty()) {
+        Put(written);
+        return kOk;
+    }
+    return WriteOutput(output, [&written](const std::string& path) {
+        std::ofstream out(path, std::ios::binary | std::ios::trunc);
+        out << written;
+        return static_cast<bool>(out.flush());
+    });
+}
+
+int Interpret(const std::string& typedKeyword, const std::string& typedText, const std::string& typedSep,
+              int decimals) {
+    std::string keyword, text, sep;
+    if (!FromTerminal("keyword", typedKeyword, keyword) || !FromTerminal("code", typedText, text) ||
+        !FromTerminal("separator", typedSep, sep))
+        return kRejected;
+    const unsigned int type = DrawingType(keyword);
+    if (type == 0) {
+        Say("carnet", "no drawing command has the keyword " + keyword +
+                          "; carnet interpret --list shows them");
+        return kUnreadable;
+    }
+    CCode entry;
+    entry.m_Decimals = decimals;
+    const Interpreted result = kInterpreters[type - CARNET_FIRST_TYPE](text, sep, entry);
+    Put(result.line.str() + "\n" + result.text.str() + "\n");
+    if (result.usable) return kOk;
+    Say("carnet", text + " does not make a usable " + CarnetKeyword(type) + " command");
+    return kRejected;
+}
+
+int ListDrawingKeywords() {
+    for (unsigned int t = CARNET_FIRST_DRAWING_TYPE; t <= CARNET_LAST_TYPE; ++t)
+        Put(std::to_string(t) + "  " + CarnetKeyword(t) + "\n");
+    return kOk;
+}
+
+}  // namespace carnet_tool
