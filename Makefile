@@ -1,7 +1,7 @@
 # Entry points: `make run` builds the tool and runs it on the bundled example;
 # `make test` builds and runs every test, plainly and under the sanitizers.
 JOBS ?= $(shell nproc)
-DEB_PACKAGES := cmake ninja-build g++ clang libgtest-dev libgmock-dev libcli11-dev libbenchmark-dev locales python3
+DEB_PACKAGES := cmake ninja-build g++ clang libgtest-dev libgmock-dev libcli11-dev libbenchmark-dev locales python3 libdxflib-dev python3-ezdxf
 
 .PHONY: all deps build run test test-release test-asan bench fuzz clean
 
@@ -24,6 +24,8 @@ build: deps
 run: build
 	./build/release/bin/carnet check examples/chantier.geo
 	./build/release/bin/carnet list --numbers examples/chantier.geo
+	./build/release/bin/carnet show examples/chantier.geo --type Point
+	./build/release/bin/carnet export examples/chantier.geo --to svg -o build/chantier.svg
 
 test: test-release test-asan
 
