@@ -1,11 +1,16 @@
-// The built carnet tool, run on the bundled example book and on broken
-// copies of it.
+// The built carnet tool, run as a person or a script runs it: a table of
+// command lines with their input files and the standard output, standard
+// error, exit status and files they must leave behind.
 #include <gtest/gtest.h>
 
+#include <sys/stat.h>
 #include <sys/wait.h>
 
+#include <algorithm>
 #include <cstdlib>
+#include <set>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "platform/store_fixture.h"
@@ -18,12 +23,14 @@ namespace {
 
 const std::string kExample = std::string(CARNET_SOURCE_DIR) + "/examples/chantier.geo";
 
+// Debian's python3, which sees Debian's python3-ezdxf.
+const char kPython[] = "/usr/bin/python3";
+
 struct Outcome {
     int status = -1;
     std::string out, err;
 };
 
-// Splits a text into its lines, without their newlines.
 std::vector<std::string> Lines(const std::string& text) {
     std::vector<std::string> lines;
     size_t start = 0;
@@ -33,20 +40,77 @@ std::vector<std::string> Lines(const std::string& text) {
     return lines;
 }
 
+std::string Replace(std::string text, const std::string& from, const std::string& to) {
+    for (size_t at = 0; (at = text.find(from, at)) != std::string::npos; at += to.size()) text.replace(at, from.size(), to);
+    return text;
+}
+
+// Whether the lines match the expected ones, where a line "..." stands for
+// any number of lines.
+bool LinesMatch(const std::vector<std::string>& got, size_t g, const std::vector<std::string>& want, size_t w) {
+    if (w == want.size()) return g == got.size();
+    if (want[w] == "...") {
+        for (size_t k = g; k <= got.size(); ++k)
+            if (LinesMatch(got, k, want, w + 1)) return true;
+        return false;
+    }
+    return g < got.size() && got[g] == want[w] && LinesMatch(got, g + 1, want, w + 1);
+}
+
+// The example book, code page 1252, and the same in UTF-8.
+std::string Example() { return ReadFile(kExample); }
+
+// Code page 1252 as UTF-8, for the bytes that the example holds: the Latin-1
+// range and the dash.
+std::string ExampleUtf8() {
+    std::string utf8;
+    for (char ch : Example()) {
+        const unsigned char c = static_cast<unsigned char>(ch);
+        if (c == 0x97)
+            utf8 += "\xE2\x80\x94";
+        else if (c >= 0xA0)
+            utf8 += {static_cast<char>(0xC0 | (c >> 6)), static_cast<char>(0x80 | (c & 0x3F))};
+        else
+            utf8 += ch;
+    }
+    return utf8;
+}
+
+// The example with other option lines.
+std::string ExampleWithOptions(const std::vector<std::string>& options) {
+    std::vector<std::string> lines = Lines(Example());
+    std::copy(options.begin(), options.end(), lines.begin());
+    std::string text;
+    for (const std::string& line : lines) text += line + "\n";
+    return text;
+}
+
+// The example with three lines broken.
+std::string Broken() {
+    std::vector<std::string> lines = Lines(Example());
+    for (std::string& line : lines) {
+        if (line.rfind("000015  ExcentRad", 0) == 0) line.replace(8, 9, "ExcentRod");
+        if (line.rfind("000022  Station          S2", 0) == 0) line = "000022  Station          S2";
+        if (line.find("Option_Planim") != std::string::npos) line.erase(line.size() - 2);
+    }
+    std::string text;
+    for (const std::string& line : lines) text += line + "\n";
+    return text;
+}
+
 class Tool : public store_test::StoreTest {
 protected:
     void SetUp() override {
         if (std::string(CARNET_TOOL).empty()) GTEST_SKIP() << "the tool is not built";
         StoreTest::SetUp();
         ::mkdir(Path("work").c_str(), 0755);
-        m_example = ReadFile(kExample);
-        ASSERT_FALSE(m_example.empty());
+        ::setenv("LC_ALL", "C", 1);  // texts shown as the file's bytes unless asked otherwise
     }
 
-    // Runs the tool with the arguments (paths without quotes or blanks).
+    // Runs the tool; $EX stands for the example, $W for the work folder.
     Outcome Carnet(const std::string& args) {
         const std::string out = Path("out.txt"), err = Path("err.txt");
-        const std::string cmd = std::string(CARNET_TOOL) + " " + args + " >" + out + " 2>" + err;
+        const std::string cmd = std::string(CARNET_TOOL) + " " + Expand(args) + " >" + out + " 2>" + err;
         const int raw = std::system(cmd.c_str());
         Outcome run;
         run.status = WIFEXITED(raw) ? WEXITSTATUS(raw) : -1;
@@ -55,160 +119,433 @@ protected:
         return run;
     }
 
-    // A copy of the example in the work folder.
-    std::string Copy(const std::string& name, const std::string& bytes) {
-        const std::string path = Path("work/" + name);
-        WriteFile(path, bytes);
-        return path;
-    }
-
-    // The example with some of its lines replaced.
-    std::string Broken() const {
-        std::vector<std::string> lines = Lines(m_example);
-        for (std::string& line : lines) {
-            if (line.rfind("000013  ExcentRad", 0) == 0) line.replace(8, 9, "ExcentRod");
-            if (line.rfind("000020  Station          S2", 0) == 0) line = "000020  Station          S2";
-            if (line.find("Option_Planim") != std::string::npos) line.erase(line.size() - 2);
-        }
-        std::string text;
-        for (const std::string& line : lines) text += line + "\n";
+    // Runs a Python script on a file; its standard output.
+    std::string Python(const std::string& script, const std::string& file) {
+        WriteFile(Path("check.py"), script);
+        const std::string out = Path("py.txt");
+        const std::string cmd = std::string(kPython) + " " + Path("check.py") + " " + file + " >" + out + " 2>&1";
+        const int raw = std::system(cmd.c_str());
+        std::string text = ReadFile(out);
+        if (!WIFEXITED(raw) || WEXITSTATUS(raw) != 0) text = "python failed: " + text;
         return text;
     }
 
-    std::string m_example;
+    std::string Expand(const std::string& text) {
+        return Replace(Replace(text, "$EX", kExample), "$W/", Path("work/"));
+    }
+};
+
+// One command line, the files it finds in the work folder, what it must show
+// and exit with, and the files it must leave there ("" for no file at all).
+struct Case {
+    const char* title;
+    std::string args;
+    std::vector<std::pair<std::string, std::string>> files;
+    int status;
+    std::string out;
+    std::string err;
+    std::vector<std::pair<std::string, std::string>> after;
+};
+
+const std::string kProfile = "[Options_Corrections]\nProjection=Projection Lambert Zone IV\nRayonTerre=8000\n";
+const std::string kOldTable = "ARB;9;Arbre\n\nHAIE;30;Haie;1;lib;3;2\r\nMUR;40;Mur;2;1\n";
+
+const Case kCases[] = {
+    {"check sums up the example", "check $EX", {}, 0, "$EX: 43 elements loaded, 0 lines rejected\n", "", {}},
+    {"check reports each rejected line after the file's name",
+     "check $W/broken.geo",
+     {{"broken.geo", Broken()}},
+     1,
+     "$W/broken.geo: 41 elements loaded, 3 lines rejected\n",
+     "$W/broken.geo: Erreur ligne 1 : la commande <Option_Planim> n'a pas le bon nombre de param\xE8tres !\n"
+     "$W/broken.geo:  (        Option_Planim                       1  0.005  0.010  0.020  0.015  0.050 0.020)\n"
+     "$W/broken.geo: Erreur ligne 15 : commande <ExcentRod> incorrecte !\n"
+     "$W/broken.geo:  (000015  ExcentRod                         0.1500)\n"
+     "$W/broken.geo: Erreur ligne 21 : commande <Station> incompl\xE8te !\n"
+     "$W/broken.geo:  (000022  Station          S2)\n",
+     {}},
+    {"the worst outcome of several files is the status",
+     "check $W/absent.geo $EX $W/",
+     {},
+     2,
+     "$W/absent.geo: not read\n$EX: 43 elements loaded, 0 lines rejected\n$W/: not read\n",
+     "$W/absent.geo: cannot read: No such file or directory\n$W/: cannot read: Is a directory\n",
+     {}},
+    {"list shows UTF-8 when asked",
+     "--output-encoding utf-8 list $EX",
+     {},
+     0,
+     "Commentaire      Lotissement \xC2\xAB Les Pr\xC3\xA9s Hauts \xC2\xBB \xE2\x80\x94 \xC3\xA9tat des lieux du 14 mars "
+     "2023\n...\nCommentaire      Fin du lev\xC3\xA9 \xC3\xA0 16 h 40\n",
+     "",
+     {}},
+    {"show aligns one row per element of a type",
+     "show $EX --type Point",
+     {},
+     0,
+     "4  Point  S1     borne OGE   X =  601234.5120 , Y = 2428765.3310 , Z =   151.8740 , CP = 3\n"
+     "5  Point  S2     calcul\xE9     X =  601404.5710 , Y = 2428836.1800\n"
+     "6  Point  S3     borne OGE   X =  601319.4840 , Y = 2428962.9360 , Z =   153.5180 , CP = 3\n"
+     "7  Point  S4     calcul\xE9     X =  601259.4840 , Y = 2429038.2960\n"
+     "8  Point  R100   clocher     X =  601890.0000 , Y = 2429012.5000 , CP = 1\n"
+     "9  Point  NGF12  rep\xE8re NGF  Z =   150.4120 , CP = 2\n",
+     "",
+     {}},
+    {"show the whole book, positions right-aligned",
+     "show $EX",
+     {},
+     0,
+     " 1  Commentaire                         Lotissement \xAB Les Pr\xE9s Hauts \xBB \x97 \xE9tat des lieux du 14 mars "
+     "2023\n...\n"
+     "15  ExcentRad                           ER =  0.1500\n...\n"
+     "43  Commentaire                         Fin du lev\xE9 \xE0 16 h 40\n",
+     "",
+     {}},
+    {"show as JSON, always UTF-8",
+     "show $EX --type CheminEncadre --json",
+     {},
+     0,
+     "[\n{\"position\": 36, \"keyword\": \"CheminEncadre\", \"number\": \"C1\", \"code\": \"\", \"text\": \"S1-1 , "
+     "S2-1 , S3-1\"},\n"
+     "{\"position\": 37, \"keyword\": \"CheminAntenne\", \"number\": \"C2\", \"code\": \"\", \"text\": \"S3-1 , "
+     "S4-1\"}\n]\n",
+     "",
+     {}},
+    {"show refuses an unknown type", "show $EX --type 999", {}, 2, "",
+     "carnet: no element type is named 999 (a code from 1000 to 1065 or a keyword)\n", {}},
+    {"find lists the elements of a number and its coordinates",
+     "find $EX S2",
+     {},
+     0,
+     " 5  Point      S2  calcul\xE9  X =  601404.5710 , Y = 2428836.1800\n"
+     "13  Reference  S2  clou     HP =   1.3000 , AH = 112.45710 , AV =  99.87120 , DI = 184.2310\n"
+     "22  Station    S2           HI =   1.5480\n"
+     "28  Reference  S2  clou     HP =   1.3000 , AH = 278.33020 , AV =  99.77900 , DI = 152.6640\n"
+     "42  NivLectAV  S2  borne                   LM =  0.3652 , DH =  37.9500\n"
+     "S2: X 601404.571000  Y 2428836.180000\n",
+     "",
+     {}},
+    {"find a number without coordinates", "find $EX 105", {}, 0,
+     "25  Mesure  105  bordure  HP =   1.3000 , AH =  45.11800 , AV = 100.02100 , DI =  28.4500\n105: no known coordinates\n",
+     "", {}},
+    {"find a number that nobody bears", "find $EX S9", {}, 1, "", "$EX: no element bears the point number S9\n", {}},
+    {"next after the last number of any type", "next $EX", {}, 0, "S5\n", "", {}},
+    {"next after the last measure", "next $EX --type Mesure", {}, 0, "110\n", "", {}},
+    {"next in an empty book", "next $W/empty.geo --type 1006", {{"empty.geo", ""}}, 0, "1\n", "", {}},
+    {"select rewrites, counts and matches",
+     "select $EX '105-103;S 4'",
+     {},
+     0,
+     "103-105;S4\n4 point numbers named, 6 elements of the book match\n"
+     " 7  Point      S4   calcul\xE9       X =  601259.4840 , Y = 2429038.2960\n"
+     "18  Mesure     103  regard EU     HP =   2.0000 , AH = 260.10450 , AV =  98.44000 , DI =  22.9050\n"
+     "20  Mesure     104  poteau b\xE9ton  HP =   1.3000 , AH = 288.90200 , AV = 100.88100 , DI =  30.7770\n"
+     "25  Mesure     105  bordure       HP =   1.3000 , AH =  45.11800 , AV = 100.02100 , DI =  28.4500\n"
+     "30  Reference  S4   piquet        HP =   1.3000 , AH =  12.66500 , AV = 100.51200 , DI =  96.3305\n"
+     "32  Station    S4                 HI =   1.5770\n",
+     "",
+     {}},
+    {"select of station set-ups",
+     "select $EX 'S2(1)-S3(1)'",
+     {},
+     0,
+     "S.2(1)-S.3(1)\n2 point numbers named, 9 elements of the book match\n...\n",
+     "",
+     {}},
+    {"select refuses a bad selection with its message", "select $EX 'P1-Q5'", {}, 1, "",
+     "$EX: Le groupe P1-Q5 pr\xE9sent dans la cha\xEEne de s\xE9lection pr\xE9sente des radicaux diff\xE9rents !\n", {}},
+    {"codes upgrades an older table and refuses nothing good",
+     "codes $W/old.txt --version 0 -o $W/new.txt",
+     {{"old.txt", kOldTable}},
+     0,
+     "",
+     "",
+     {{"new.txt", "ARB;9;Arbre\nHAIE;31;Haie;1;lib;3;2;0;;;0;;0;;0;;0;0\nMUR;43;Mur;2;1\n"}}},
+    {"codes of the current version reads back what it writes",
+     "codes $W/new.txt --version 5",
+     {{"new.txt", "ARB;9;Arbre\nHAIE;31;Haie;1;lib;3;2;0;;;0;;0;;0;;0;0\nMUR;43;Mur;2;1\n"}},
+     0,
+     "ARB;9;Arbre\nHAIE;31;Haie;1;lib;3;2;0;;;0;;0;;0;;0;0\nMUR;43;Mur;2;1\n",
+     "",
+     {}},
+    {"codes reports the lines it refuses and writes nothing",
+     "codes $W/bad.txt --version 5 -o $W/new.txt",
+     {{"bad.txt", "ARB;9;Arbre\n;9;sans code\nK;abc;Kind\nSEUL\n"}},
+     1,
+     "",
+     "$W/bad.txt:2: refused, no code before the first \";\": ;9;sans code\n"
+     "$W/bad.txt:3: refused, the kind \"abc\" is not a whole number: K;abc;Kind\n"
+     "$W/bad.txt:4: refused, no kind after the code: SEUL\n"
+     "$W/bad.txt: 3 lines refused; nothing written, they would be lost\n",
+     {{"new.txt", ""}}},
+    {"codes refuses a version beyond the current one", "codes $W/t.txt --version 6", {{"t.txt", "A;9;a\n"}}, 2,
+     "", "carnet: --version: Value 6 not in range 0 to 5\n...\n", {}},
+    {"interpret in sign mode with implied decimals",
+     "interpret Sym_sans_Ori ARB+150-075 --sep '\xB1' --decimals 2",
+     {},
+     0,
+     "Sym_sans_Ori                      ARB  1.500  -0.750\nCode = ARB , Ech X = 1.500 , Ech Y = -0.750\n",
+     "",
+     {}},
+    {"interpret by type code", "interpret 1035 CER/L12/250 --decimals 2", {}, 0,
+     "Cercle_R                          CER  L12  2.500\nCode = CER , Liaison = L12 , Rayon = 2.500\n", "", {}},
+    {"interpret a UTF-8 keyword, case ignored", "interpret 'PARALL\xC3\x88LE' PAR/L2/15", {}, 0,
+     "Parall\xE8le                         PAR  L2  15.000\nCode = PAR , Liaison = L2 , D\xE9" "calage = 15.000\n",
+     "", {}},
+    {"interpret says when the command is not usable", "interpret Inter_Dist ID/5", {}, 1,
+     "Inter_Dist                        ID  5.000  -999999.000\nCode = ID\n",
+     "carnet: ID/5 does not make a usable Inter_Dist command\n", {}},
+    {"interpret refuses an unknown keyword", "interpret Point P1", {}, 2, "",
+     "carnet: no drawing command has the keyword Point; carnet interpret --list shows them\n", {}},
+    {"interpret lists the 55 drawing keywords", "interpret --list", {}, 0,
+     "1011  PT_Sans_Ori\n...\n1033  Sym_Entr\xE9" "e\n...\n1065  Inter_Dist\n", "", {}},
+    {"options of no location are the defaults",
+     "options",
+     {},
+     0,
+     "        Option_Correc                       1  0.0  0.0  0.000  0.000  0.000  6366.000\n"
+     "        Option_Projec                       Aucune\n"
+     "        Option_Nivell                       0  0  0.010\n"
+     "        Option_Planim                       0  0.010  0.010  0.010  0.010  0.010 0.010 0\n",
+     "",
+     {}},
+    {"options of a profile file, clamped, the file untouched",
+     "options --params $W/params.ini",
+     {{"params.ini", kProfile}},
+     0,
+     "        Option_Correc                       1  0.0  0.0  0.000  0.000  0.000  7000.000\n"
+     "        Option_Projec                       Projection Lambert Zone IV\n...\n",
+     "",
+     {{"params.ini", kProfile}}},
+    {"options of a missing profile file say so", "options --params $W/none.ini", {}, 0, "...\n",
+     "$W/none.ini: no such profile file: these are the default options\n", {}},
+    {"projection of the example", "projection $EX", {}, 0, "Projection Lambert Zone II\n", "", {}},
+    {"projection of a book that declares none", "projection $W/p.geo", {{"p.geo", "Station S1 1.5\n"}}, 0, "",
+     "$W/p.geo: declares no projection\n", {}},
+    {"export of the points as CSV",
+     "export $EX --to csv",
+     {},
+     0,
+     "name,x,y,z,code,locks\n"
+     "S1,601234.512000,2428765.331000,151.874000,borne OGE,3\n"
+     "S2,601404.571000,2428836.180000,,calcul\xC3\xA9,0\n"
+     "S3,601319.484000,2428962.936000,153.518000,borne OGE,3\n"
+     "S4,601259.484000,2429038.296000,,calcul\xC3\xA9,0\n"
+     "R100,601890.000000,2429012.500000,,clocher,1\n"
+     "NGF12,,,150.412000,rep\xC3\xA8re NGF,2\n",
+     "",
+     {}},
+    {"export quotes CSV fields and breaks a path at a station without position",
+     "export $W/q.geo --to csv",
+     {{"q.geo", "Point P1 1.0 2.0 a,\"b\"\nStation P1 1.5\nStation P2 1.5\nCheminAntenne C P1-1 P2-1\n"}},
+     0,
+     "name,x,y,z,code,locks\nP1,1.000000,2.000000,,\"a,\"\"b\"\"\",0\n",
+     "$W/q.geo: path C: no plan position for P2; not drawn\n",
+     {}},
+    {"format reproduces the example", "format $W/c.geo", {{"c.geo", Example()}}, 0, "", "", {{"c.geo", Example()}}},
+    {"format saves a UTF-8 book in code page 1252", "format $W/u.geo -o $W/c.geo", {{"u.geo", ExampleUtf8()}}, 0,
+     "", "", {{"c.geo", Example()}}},
+    {"a character that code page 1252 cannot hold stops the save",
+     "--output-encoding utf-8 format $W/u.geo -o $W/c.geo",
+     {{"u.geo", "Commentaire ok\nCommentaire fl\xC3\xA8" "che \xE2\x86\x92 ici\n"}},
+     1,
+     "",
+     "$W/u.geo:2: stopped, nothing written: code page 1252 has no place for the character U+2192 \"\xE2\x86\x92\"\n",
+     {{"c.geo", ""}}},
+    {"a code page 1252 book is not taken for UTF-8", "--encoding utf-8 check $EX", {}, 1, "$EX: refused\n",
+     "$EX:5: not UTF-8 (byte 0xAB); --encoding cp1252 reads a code page 1252 file\n", {}},
+    {"--encoding cp1252 keeps UTF-8 bytes as they are",
+     "--encoding cp1252 show $W/u.geo",
+     {{"u.geo", "Commentaire pr\xC3\xA9" "s\n"}},
+     0,
+     "1  Commentaire  pr\xC3\xA9" "s\n",
+     "",
+     {}},
+    {"format refuses to lose rejected lines", "format --backup $W/broken.geo", {{"broken.geo", Broken()}}, 1, "",
+     "...\n", {{"broken.geo", Broken()}, {"broken.sbk", ""}}},
+    {"format writes the options of a location without changing them",
+     "format --params $W/params.ini $W/c.geo",
+     {{"params.ini", kProfile}, {"c.geo", Example()}},
+     0,
+     "",
+     "",
+     {{"params.ini", kProfile},
+      {"c.geo", ExampleWithOptions({
+                    "        Option_Correc                       1  0.0  0.0  0.000  0.000  0.000  7000.000",
+                    "        Option_Projec                       Projection Lambert Zone IV",
+                    "        Option_Nivell                       0  0  0.010",
+                    "        Option_Planim                       0  0.010  0.010  0.010  0.010  0.010 0.010 0",
+                })}}},
+    {"format keeps a backup of the file it replaces",
+     "format --backup $W/loose.geo -o $W/c.geo",
+     {{"loose.geo", "Station   S1 1.562 0\n"}, {"c.geo", "Commentaire avant\n"}},
+     0,
+     "",
+     "",
+     {{"c.sbk", "Commentaire avant\n"}}},
+    {"format names the file it cannot write",
+     "--output-encoding cp1252 format $EX -o $W/absent/c.geo",
+     {},
+     2,
+     "",
+     "$W/absent/c.geo: Impossible d'enregistrer la Sitebook sous $W/absent/c.geo !\n",
+     {}},
+    {"an export that cannot be written leaves nothing", "export $EX --to svg -o $W/absent/c.svg", {}, 2, "",
+     "$W/absent/c.svg: cannot write: No such file or directory\n", {}},
+    {"no subcommand prints the help", "", {}, 0, "carnet: inspect, query, convert and export land-surveying field books (.geo files)\n...\n", "", {}},
+    {"a usage error", "export $EX --to pdf", {}, 2, "",
+     "carnet: --to: pdf not in {csv,geojson,dxf,svg}\ncarnet --help tells how to use it\n", {}},
+    {"a missing argument", "check", {}, 2, "", "carnet: files is required\ncarnet --help tells how to use it\n", {}},
+    {"--version names the licenses", "--version", {}, 0,
+     "carnet 0.1.0\nThis tool is free software under the GNU General Public License, version 2 or\n...\n", "", {}},
 };
 
 }  // namespace
 
-TEST_F(Tool, CheckSumsUpTheExampleAndItsBrokenCopy) {
-    Outcome run = Carnet("check " + kExample);
-    EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(run.out, kExample + ": 41 elements loaded, 0 lines rejected\n");
-    EXPECT_EQ(run.err, "");
-
-    const std::string broken = Copy("broken.geo", Broken());
-    run = Carnet("--encoding cp1252 check " + broken);
-    EXPECT_EQ(run.status, 1);
-    EXPECT_EQ(run.out, broken + ": 39 elements loaded, 3 lines rejected\n");
-    EXPECT_EQ(Lines(run.err), (std::vector<std::string>{
-                                  broken + ": Erreur ligne 1 : la commande <Option_Planim> n'a pas le bon nombre de "
-                                           "param\xE8tres !",
-                                  broken + ":  (        Option_Planim                       1  0.005  0.010  0.020  "
-                                           "0.015  0.050 0.020)",
-                                  broken + ": Erreur ligne 13 : commande <ExcentRod> incorrecte !",
-                                  broken + ":  (000013  ExcentRod                         0.1500)",
-                                  broken + ": Erreur ligne 19 : commande <Station> incompl\xE8te !",
-                                  broken + ":  (000020  Station          S2)",
-                              }));
-
-    // Every file is summed up; the worst outcome is the status.
-    const std::string missing = Path("work/absent.geo");
-    run = Carnet("check " + missing + " " + broken + " " + kExample + " " + Path("work"));
-    EXPECT_EQ(run.status, 2);
-    EXPECT_EQ(Lines(run.out), (std::vector<std::string>{
-                                  missing + ": not read",
-                                  broken + ": 39 elements loaded, 3 lines rejected",
-                                  kExample + ": 41 elements loaded, 0 lines rejected",
-                                  Path("work") + ": not read",
-                              }));
-    EXPECT_EQ(Lines(run.err).front(), "carnet: cannot read " + missing + ": No such file or directory");
-    EXPECT_EQ(Lines(run.err).back(), "carnet: cannot read " + Path("work") + ": Is a directory");
+TEST_F(Tool, CommandLines) {
+    for (const Case& c : kCases) {
+        SCOPED_TRACE(c.title);
+        ASSERT_EQ(std::system(("rm -rf " + Path("work") + " && mkdir " + Path("work")).c_str()), 0);
+        for (const auto& file : c.files) WriteFile(Path("work/" + file.first), file.second);
+        const Outcome run = Carnet(c.args);
+        EXPECT_EQ(run.status, c.status);
+        EXPECT_TRUE(LinesMatch(Lines(run.out), 0, Lines(Expand(c.out)), 0)) << run.out;
+        EXPECT_TRUE(LinesMatch(Lines(run.err), 0, Lines(Expand(c.err)), 0)) << run.err;
+        for (const auto& file : c.after) {
+            struct stat st;
+            const bool exists = ::stat(Path("work/" + file.first).c_str(), &st) == 0;
+            EXPECT_EQ(exists, !file.second.empty()) << file.first;
+            if (exists) {
+                EXPECT_EQ(ReadFile(Path("work/" + file.first)), file.second) << file.first;
+            }
+        }
+        // Nothing is left behind but what the case expects: no temporary file.
+        std::set<std::string> expected;
+        for (const auto& file : c.files) expected.insert(file.first);
+        for (const auto& file : c.after)
+            if (!file.second.empty()) expected.insert(file.first);
+        EXPECT_EQ(Entries(Path("work")), std::vector<std::string>(expected.begin(), expected.end()));
+    }
 }
 
-TEST_F(Tool, ListPrintsTheBooksLines) {
-    // The saved file's element lines, with or without their numbers.
-    std::vector<std::string> numbered = Lines(m_example);
-    ASSERT_GT(numbered.size(), 4u);
-    numbered.erase(numbered.begin(), numbered.begin() + 4);
-    std::vector<std::string> plain;
-    for (const std::string& line : numbered) plain.push_back(line.substr(8));
-
-    Outcome run = Carnet("--encoding cp1252 list --numbers " + kExample);
-    EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(Lines(run.out), numbered);
-    EXPECT_EQ(run.err, "");
-    run = Carnet("list " + kExample + " --encoding cp1252");
-    EXPECT_EQ(Lines(run.out), plain);
-
-    // UTF-8 for a terminal that wants it, the dash of code page 1252 included.
-    run = Carnet("--encoding utf8 list " + kExample);
-    EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(Lines(run.out).front(),
-              "Commentaire      Lotissement \xC2\xAB Les Pr\xC3\xA9s Hauts \xC2\xBB \xE2\x80\x94 \xC3\xA9tat des lieux "
-              "du 14 mars 2023");
-
-    // A broken book is listed without its rejected lines.
-    run = Carnet("list " + Copy("broken.geo", Broken()));
-    EXPECT_EQ(run.status, 1);
-    EXPECT_EQ(Lines(run.out).size(), plain.size() - 2);
-    EXPECT_EQ(Carnet("list " + Path("work/absent.geo")).status, 2);
+TEST_F(Tool, EverySubcommandHelpHasAnExample) {
+    for (const char* sub : {"check", "list", "show", "find", "next", "select", "codes", "interpret", "options",
+                            "projection", "format", "export"}) {
+        SCOPED_TRACE(sub);
+        const Outcome run = Carnet(std::string(sub) + " --help");
+        EXPECT_EQ(run.status, 0);
+        const size_t example = run.out.find("Example:\n  carnet " + std::string(sub) + " ");
+        EXPECT_NE(example, std::string::npos) << run.out;
+    }
 }
 
-TEST_F(Tool, FormatReproducesTheExampleAndKeepsABackup) {
-    const std::string book = Copy("chantier.geo", m_example);
-    Outcome run = Carnet("format " + book);
-    EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(run.out + run.err, "");
-    EXPECT_EQ(ReadFile(book), m_example);
+// The exports opened by the readers of other programs.
+TEST_F(Tool, ExportsOpenInTheirReaders) {
+    for (const char* format : {"geojson", "dxf", "svg"})
+        ASSERT_EQ(Carnet("export $EX --to " + std::string(format) + " -o $W/c." + format).status, 0) << format;
 
-    // From a loosely typed book with older option lines, to another file.
-    const std::string loose = Copy("saisie.geo",
-                                   "Cal_Cor 1 601250 2428760 152 6366\n"
-                                   "Tol_Niv 1 0 15\n"
-                                   "Station   S1 1.562 0\n"
-                                   "Mesure 101 1.3 201.2201 100.415 35.412 angle***b\xE2ti\n");
-    const std::string out = Path("work/propre.geo");
-    run = Carnet("format " + loose + " -o " + out);
-    EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(Lines(ReadFile(out)),
-              (std::vector<std::string>{
-                  "        Option_Correc                       0  0.0  0.0  601250.000  2428760.000  152.000  6366.000",
-                  "        Option_Projec                       Projection Lambert Zone II",
-                  "        Option_Nivell                       1  0  0.015",
-                  "        Option_Planim                       0  0.010  0.010  0.010  0.010  0.010 0.010 0",
-                  "000001  Station          S1                1.562000   0.0000000                    ",
-                  "000002  Mesure           101               1.300000 201.2201000 100.4150000  35.412000 "
-                  "angle***b\xE2ti",
-              }));
+    EXPECT_EQ(Python("import json, sys\n"
+                     "d = json.load(open(sys.argv[1], encoding='utf-8'))\n"
+                     "print(d['type'], d['name'], d['projection'])\n"
+                     "for f in d['features']:\n"
+                     "    g = f['geometry']\n"
+                     "    p = f['properties']\n"
+                     "    print(g and g['type'], g and g['coordinates'], p['name'], p.get('code'), p.get('locks'),\n"
+                     "          p.get('station'), p.get('kind'), p.get('stations'))\n",
+                     Path("work/c.geojson")),
+              "FeatureCollection chantier.geo Projection Lambert Zone II\n"
+              "Point [601234.512, 2428765.331, 151.874] S1 borne OGE 3 True None None\n"
+              "Point [601404.571, 2428836.18] S2 calcul\xC3\xA9 0 True None None\n"
+              "Point [601319.484, 2428962.936, 153.518] S3 borne OGE 3 True None None\n"
+              "Point [601259.484, 2429038.296] S4 calcul\xC3\xA9 0 True None None\n"
+              "Point [601890.0, 2429012.5] R100 clocher 1 False None None\n"
+              "None None NGF12 rep\xC3\xA8re NGF 2 False None None\n"
+              "LineString [[601234.512, 2428765.331], [601404.571, 2428836.18], [601319.484, 2428962.936]] C1 "
+              "None None None framed ['S1-1', 'S2-1', 'S3-1']\n"
+              "LineString [[601319.484, 2428962.936], [601259.484, 2429038.296]] C2 None None None antenna "
+              "['S3-1', 'S4-1']\n");
 
-    // The backup holds the file as it was before.
-    run = Carnet("format --backup " + loose + " -o " + book);
-    EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(ReadFile(Path("work/chantier.sbk")), m_example);
-    EXPECT_EQ(ReadFile(book), ReadFile(out));
-    EXPECT_EQ(Entries(Path("work")),
-              (std::vector<std::string>{"chantier.geo", "chantier.sbk", "propre.geo", "saisie.geo"}));
+    EXPECT_EQ(Python("import sys, ezdxf\n"
+                     "doc = ezdxf.readfile(sys.argv[1])\n"
+                     "msp = doc.modelspace()\n"
+                     "print(sorted(l.dxf.name for l in doc.layers))\n"
+                     "for p in msp.query('POINT'):\n"
+                     "    print('point', p.dxf.layer, tuple(round(v, 3) for v in p.dxf.location))\n"
+                     "for t in msp.query('TEXT'):\n"
+                     "    print('text', t.dxf.layer, t.dxf.text)\n"
+                     "for l in msp.query('LWPOLYLINE POLYLINE'):\n"
+                     "    print('line', l.dxf.layer, [tuple(round(c, 3) for c in v[:2]) for v in l.get_points()])\n",
+                     Path("work/c.dxf")),
+              "['0', 'CHEMINS', 'Defpoints', 'borne OGE', 'calcul\xC3\xA9', 'clocher']\n"
+              "point borne OGE (601234.512, 2428765.331, 151.874)\n"
+              "point calcul\xC3\xA9 (601404.571, 2428836.18, 0.0)\n"
+              "point borne OGE (601319.484, 2428962.936, 153.518)\n"
+              "point calcul\xC3\xA9 (601259.484, 2429038.296, 0.0)\n"
+              "point clocher (601890.0, 2429012.5, 0.0)\n"
+              "text borne OGE S1\ntext calcul\xC3\xA9 S2\ntext borne OGE S3\ntext calcul\xC3\xA9 S4\ntext clocher R100\n"
+              "line CHEMINS [(601234.512, 2428765.331), (601404.571, 2428836.18), (601319.484, 2428962.936)]\n"
+              "line CHEMINS [(601319.484, 2428962.936), (601259.484, 2429038.296)]\n");
+
+    // The plot: every mark inside the page, north up (S3 lies north of S1),
+    // the scale bar's length as drawn matching its label.
+    EXPECT_EQ(Python("import sys, re, xml.etree.ElementTree as ET\n"
+                     "ns = {'s': 'http://www.w3.org/2000/svg'}\n"
+                     "root = ET.parse(sys.argv[1]).getroot()\n"
+                     "print(root.get('viewBox'), root.find('s:title', ns).text)\n"
+                     "marks = {}\n"
+                     "for t in root.find(\"s:g[@id='labels']\", ns):\n"
+                     "    marks[t.text] = (float(t.get('x')), float(t.get('y')))\n"
+                     "print(sorted(marks), all(0 < x < 297 and 0 < y < 210 for x, y in marks.values()))\n"
+                     "print(marks['S3'][1] < marks['S1'][1], marks['R100'][0] > marks['S1'][0])\n"
+                     "print(len(root.findall(\".//s:path[@class='station']\", ns)),\n"
+                     "      len(root.findall(\".//s:circle[@class='point']\", ns)),\n"
+                     "      len(root.findall(\".//s:g[@id='paths']/s:polyline\", ns)))\n"
+                     "bar = root.find(\"s:g[@id='scale']\", ns)\n"
+                     "width = float(re.search(r'h ([0-9.]+)', bar.find('s:path', ns).get('d')).group(1))\n"
+                     "metres = float(bar.find('s:text', ns).text.split()[0])\n"
+                     "s1, s3 = marks['S1'], marks['S3']\n"
+                     "page = ((s1[0] - s3[0]) ** 2 + (s1[1] - s3[1]) ** 2) ** 0.5\n"
+                     "print(round(page / (width / metres), 1))\n",
+                     Path("work/c.svg")),
+              "0 0 297 210 chantier.geo \xE2\x80\x94 Projection Lambert Zone II\n"
+              "['R100', 'S1', 'S2', 'S3', 'S4'] True\nTrue True\n4 1 2\n215.1\n");
 }
 
-TEST_F(Tool, FormatTakesTheOptionsOfALocationWithoutChangingThem) {
-    const std::string profile = Path("params.ini");
-    const std::string settings = "[Options_Corrections]\nProjection=Projection Lambert Zone IV\nCorrAuto=0\n";
-    WriteFile(profile, settings);
-    const std::string book = Copy("chantier.geo", m_example);
-    Outcome run = Carnet("format --params " + profile + " " + book);
+// A large generated book goes through the reading and writing commands.
+TEST_F(Tool, LargeGeneratedBook) {
+    const int kStations = 20000;  // ten elements each: 200 000 elements
+    std::string book;
+    for (int s = 1; s <= kStations; ++s) {
+        book += "Point S" + std::to_string(s) + " 3 " + std::to_string(600000 + s) + ".125 " +
+                std::to_string(2400000 + (s * 7) % 5000) + ".250 " + std::to_string(100 + s % 50) + ".500 borne\n";
+        book += "Station S" + std::to_string(s) + " 1.550000 12.3456789\n";
+        for (int m = 1; m <= 6; ++m)
+            book += "Mesure " + std::to_string(s * 10 + m) + " 1.300000 201.2201000 100.4150000 35.412000 arbre\n";
+        book += "Commentaire d\xE9tail " + std::to_string(s) + "\n";
+        book += "CheminAntenne C" + std::to_string(s) + " S" + std::to_string(s) + "-1 S" +
+                std::to_string(s % kStations + 1) + "-1\n";
+    }
+    WriteFile(Path("work/big.geo"), book);
+
+    Outcome run = Carnet("check $W/big.geo");
+    EXPECT_EQ(run.out, Path("work/big.geo") + ": 200000 elements loaded, 0 lines rejected\n");
+    run = Carnet("show $W/big.geo --type Station");
     EXPECT_EQ(run.status, 0);
-    const std::vector<std::string> lines = Lines(ReadFile(book));
-    ASSERT_GT(lines.size(), 2u);
-    EXPECT_EQ(lines[0], "        Option_Correc                       0  0.0  0.0  0.000  0.000  0.000  6366.000");
-    EXPECT_EQ(lines[1], "        Option_Projec                       Projection Lambert Zone IV");
-    EXPECT_EQ(ReadFile(profile), settings);
-    EXPECT_EQ(Entries(Dir()), (std::vector<std::string>{"err.txt", "out.txt", "params.ini", "work"}));
-}
-
-TEST_F(Tool, FormatRefusesToLoseLinesAndReportsAFailedSave) {
-    const std::string broken = Copy("broken.geo", Broken());
-    Outcome run = Carnet("format --backup " + broken);
-    EXPECT_EQ(run.status, 1);
-    EXPECT_EQ(Lines(run.err).back(), "carnet: " + broken + ": 3 lines rejected; nothing written, they would be lost");
-    EXPECT_EQ(ReadFile(broken), Broken());
-    EXPECT_EQ(Entries(Path("work")), std::vector<std::string>{"broken.geo"});
-
-    const std::string refused = Path("work/absent/chantier.geo");
-    run = Carnet("--encoding cp1252 format " + kExample + " -o " + refused);
-    EXPECT_EQ(run.status, 2);
-    EXPECT_EQ(run.err, "carnet: Impossible d'enregistrer la Sitebook sous\n" + refused + " !\n");
-    run = Carnet("format " + kExample + " -o /dev/full");
-    EXPECT_EQ(run.status, 2);
-    EXPECT_NE(run.err.find("Impossible d'enregistrer"), std::string::npos);
-    EXPECT_NE(Carnet("check").status, 0);  // no file given
+    EXPECT_EQ(Lines(run.out).size(), static_cast<size_t>(kStations));
+    EXPECT_EQ(Lines(run.out).back(), "199992  Station  S20000  HI =   1.5500 , V0 =  12.34568");
+    EXPECT_EQ(Carnet("next $W/big.geo --type Mesure").out, "200007\n");
+    for (const char* format : {"csv", "geojson", "dxf", "svg"}) {
+        run = Carnet("export $W/big.geo --to " + std::string(format) + " -o $W/big." + format);
+        EXPECT_EQ(run.status, 0) << format << run.err;
+        EXPECT_EQ(run.err, "") << format;
+    }
+    EXPECT_EQ(Lines(ReadFile(Path("work/big.csv"))).size(), static_cast<size_t>(kStations + 1));
+    EXPECT_EQ(Python("import json, sys\n"
+                     "d = json.load(open(sys.argv[1]))\n"
+                     "print(sum(f['geometry']['type'] == 'Point' for f in d['features']),\n"
+                     "      sum(f['geometry']['type'] == 'LineString' for f in d['features']))\n",
+                     Path("work/big.geojson")),
+              "20000 20000\n");
+    const std::string dxf = ReadFile(Path("work/big.dxf"));
+    EXPECT_EQ(dxf.substr(dxf.size() - 4), "EOF\n");
 }

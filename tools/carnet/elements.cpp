@@ -14,7 +14,9 @@ namespace {
 
 void Put(const std::string& text) { std::fwrite(text.data(), 1, text.size(), stdout); }
 
+// A column that is empty in every row takes no room.
 void Pad(std::string& line, const CString& text, size_t width) {
+    if (width == 0) return;
     line += text.str();
     line.append(width - std::min<size_t>(width, text.str().size()), ' ');
     line += "  ";

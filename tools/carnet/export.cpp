@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <set>
+#include <unordered_map>
 
 #include <carnet/carnet.h>
 
@@ -47,7 +48,7 @@ std::string JsonGeometry(const ExportPath& path) {
 }
 
 // The points and paths of a book. A path is drawn through the first point
-// that bears each station's number; it is broken where a station has no
+// that bears each station's number, as the book's own lookups take it; it is broken where a station has no
 // plan position, which is said on standard error.
 Survey Gather(CCarnet& book, const std::string& path) {
     Survey survey;
@@ -57,9 +58,17 @@ Survey Gather(CCarnet& book, const std::string& path) {
     GetParamString(CurrentSession().store.Location().c_str(), "Options_Corrections", "Projection", "", &projection);
     if (projection != "Aucune") survey.projection = projection.str();
 
+    // The first point of each number, as the book's lookups find it, and
+    // the numbers that stations are set up on: one pass, not one per query.
     std::set<std::string> stations;
-    for (int i = 0; i < book.length(); ++i)
+    std::unordered_map<std::string, const CPointGen*> firstPoint;
+    for (int i = 0; i < book.length(); ++i) {
         if (book.typAt(i) == kStation) stations.insert(book.matAt(i).str());
+        if (book.typAt(i) == kPoint) {
+            const CPointGen* p = static_cast<const CPointGen*>(book.ptrAt(i));
+            firstPoint.emplace(p->m_Np.str(), p);
+        }
+    }
     for (int i = 0; i < book.length(); ++i) {
         if (book.typAt(i) == kPoint) {
             const CPointGen& p = *static_cast<const CPointGen*>(book.ptrAt(i));
@@ -72,9 +81,9 @@ Survey Gather(CCarnet& book, const std::string& path) {
             std::string missing;
             for (int k = 0; k < c.length(); ++k) {
                 line.stations.push_back(numconv::Format("%s-%d", c.matAt(k).GetString(), c.repAt(k)));
-                double x = UNDEF_VALUE, y = UNDEF_VALUE;
-                if (book.hasXY(c.matAt(k), x, y) >= 0) {
-                    line.parts.back().push_back({x, y});
+                const auto found = firstPoint.find(c.matAt(k).str());
+                if (found != firstPoint.end() && found->second->hasXY()) {
+                    line.parts.back().push_back({found->second->m_X, found->second->m_Y});
                     continue;
                 }
                 missing += (missing.empty() ? "" : ", ") + c.matAt(k).str();

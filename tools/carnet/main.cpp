@@ -32,10 +32,18 @@ const char kFooter[] =
     "in code page 1252; a character that it cannot hold stops the command and\n"
     "nothing is written.\n"
     "\n"
-    "Examples:\n"
-    "  carnet check chantier.geo                 carnet list -n chantier.geo\n"
-    "  carnet show chantier.geo --type Point     carnet find chantier.geo S1\n"
-    "  carnet next chantier.geo --type Mesure    carnet select chantier.geo '101-105'\n"
+    "Examples (carnet SUBCOMMAND --help tells more):\n"
+    "  carnet check chantier.geo\n"
+    "  carnet list --numbers chantier.geo\n"
+    "  carnet show chantier.geo --type Point --json\n"
+    "  carnet find chantier.geo S1\n"
+    "  carnet next chantier.geo --type Mesure\n"
+    "  carnet select chantier.geo '105-101;S1'\n"
+    "  carnet codes old-table.txt --version 3 -o table.txt\n"
+    "  carnet interpret Cercle_R CER/L12/250 --decimals 2\n"
+    "  carnet options --params options.ini\n"
+    "  carnet projection chantier.geo\n"
+    "  carnet format --backup chantier.geo\n"
     "  carnet export chantier.geo --to svg -o chantier.svg\n"
     "\n"
     "Exit status: 0 when all went well; 1 when lines of a book were rejected or\n"
@@ -104,7 +112,7 @@ int main(int argc, char** argv) {
 
     CLI::App* select = Subcommand(app, "select",
                                   "Check and rewrite a selection string, count its point numbers, show what matches",
-                                  "carnet select chantier.geo '105-101;S*'");
+                                  "carnet select chantier.geo '105-101;S1'");
     select->add_option("file", file, "Field-book file")->required();
     select->add_option("selection", text, "Selection string, such as 1-5;8;P.1-P.20;A.*")->required();
 
