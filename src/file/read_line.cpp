@@ -92,6 +92,10 @@ void* ReadContext::Incorrect() {
 }
 
 void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend) {
+    // A line ends at a NUL byte, as every text of the library and the host
+    // does: the bytes after one in a damaged file would be lost or cut
+    // differently by each writer, so the saved book would not load the same.
+    line = line.substr(0, line.find('\0'));
     if (line.empty()) return nullptr;
     assert(index >= 0 && index <= book.length());
     ReadContext ctx(book, wnd, line, index, bAppend);

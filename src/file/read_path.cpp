@@ -1,5 +1,7 @@
 // Traverse-path lines: a path written over several lines is rebuilt as one
 // element when its lines follow each other.
+#include <memory>
+
 #include <carnet/chemin.h>
 
 #include "file/reader_internal.h"
@@ -20,11 +22,14 @@ void* ReadPath(ReadContext& ctx) {
         }
     }
     if (n < 3) return ctx.Incomplete();
-    auto* path = new CChemin(ctx.Word(0));
+    auto path = std::make_unique<CChemin>(ctx.Word(0));
     path->setAntenne(ctx.cut.keyword == CarnetTypeInfo(1007)->keywords[1] ? 0 : 1);
     for (size_t i = 1; i < n; ++i) path->add(ctx.Word(i));
-    book.append(path, 1007);
-    return path;
+    // A word that add refuses (one that begins with a hyphen) is no station:
+    // a path of fewer than two would be saved as a line that cannot load.
+    if (path->length() < 2) return ctx.Incomplete();
+    book.append(path.get(), 1007);
+    return path.release();
 }
 
 }  // namespace carnet_reader

@@ -8,6 +8,7 @@
 #include <carnet/point.h>
 #include <carnet/reference.h>
 #include <carnet/station.h>
+#include <carnet/undef.h>
 
 #include "core/line_internal.h"
 #include "file/reader_internal.h"
@@ -63,8 +64,19 @@ void* ReadStation(ReadContext& ctx) {
     return ctx.Store(new CStation(ctx.Word(0), ctx.Number(1), v0, n == 4 ? SymbolWord(ctx, 3) : CString()), 1001);
 }
 
+// The writer leaves an absent observation out of the line, so a value word
+// that reads as the absent value itself would be saved as a line of another
+// shape: such a line is refused like an incomplete one.
+bool ReadsAsAbsent(const ReadContext& ctx, size_t first, size_t last) {
+    for (size_t i = first; i <= last; ++i)
+        if (IsUndef(ctx.Number(i))) return true;
+    return false;
+}
+
 void* ReadObservation(ReadContext& ctx, unsigned int code) {
     const size_t n = ctx.WordCount();
+    if ((n == 2 || n == 3) && ReadsAsAbsent(ctx, 1, 1)) return ctx.Incomplete();
+    if ((n == 5 || n == 6) && ReadsAsAbsent(ctx, 1, 4)) return ctx.Incomplete();
     CReference* r = nullptr;
     auto make = [code](auto&&... args) -> CReference* {
         if (code == 1003) return new CMesure(args...);
@@ -140,7 +152,9 @@ void* ReadLevelling(ReadContext& ctx, unsigned int code) {
             sy = SymbolWord(ctx, i);
         }
     }
-    if (count == 0) return ctx.Incomplete();
+    // An absent reading is written as blanks and would come back as the
+    // distance (an absent distance comes back as itself).
+    if (count == 0 || IsUndef(values[0])) return ctx.Incomplete();
     return ctx.Store(new Reading(ctx.Word(0), values[0], count == 2 ? values[1] : UNDEF_VALUE, sy), code);
 }
 

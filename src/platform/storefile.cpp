@@ -79,11 +79,15 @@ int ReadAll(const std::string& path, std::string& out) {
     out.clear();
     int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
     if (fd < 0) return Fail(errno);
-    const size_t step = 1 << 16;
+    // Room for the whole file and one byte to see its end, so that a store
+    // is read with one allocation; what has no size grows as it comes.
+    size_t step = 1 << 16;
+    struct stat st;
+    if (::fstat(fd, &st) == 0 && S_ISREG(st.st_mode) && st.st_size > 0) step = static_cast<size_t>(st.st_size) + 1;
     size_t used = 0;
     for (;;) {
-        out.resize(used + step);
-        ssize_t n = ::read(fd, &out[used], step);
+        if (out.size() == used) out.resize(used + step);
+        ssize_t n = ::read(fd, &out[used], out.size() - used);
         if (n == 0) break;
         if (n < 0) {
             if (errno == EINTR) continue;

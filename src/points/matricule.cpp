@@ -84,6 +84,11 @@ void CCarnet::formMat(const CString& radical, int number, int& dotted, CString& 
         if (number == 0) {
             s = radical;
             dotted = 0;
+        } else if (!dotted && radical[radical.GetLength() - 1] == '*') {
+            // The radical of a plain wildcard already ends with its star
+            // (P* splits into P* and -1): another one would make every
+            // normalisation of P* one star longer.
+            s = radical;
         } else {
             s = radical + (dotted ? ".*" : "*");
         }
@@ -119,6 +124,15 @@ void CCarnet::formMat(CString& np, CString& radical, int& number, int& dotted, i
         }
     }
     formMat(radical, number, dotted, np);
+    // A number 0 leaves the radical alone, and a radical may read otherwise
+    // on its own: digits at its end are a number (P07 from P07.0 is P7), a
+    // star in it makes a wildcard (A*B from A*B00 is A*B*). Split and build
+    // again until the result is what its own normalisation gives; two more
+    // rounds always suffice.
+    for (int round = 0; round < 2 && number == 0 && !dotted && !np.IsEmpty(); ++round) {
+        extrMat(np, radical, number, dotted, 0);
+        formMat(radical, number, dotted, np);
+    }
 }
 
 void CCarnet::formMat(const CString& np, CString& out) {

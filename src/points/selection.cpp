@@ -64,7 +64,11 @@ bool CanonicalRange(const CString& group, int dash, CString& out) {
     const bool station = IsStationRef(range.first);
     SelPoint a = Split(range.first, station);
     SelPoint b = Split(range.second, station);
-    if (a.radical != "*" && b.radical != "*" && a.radical != b.radical) {
+    // The second end is one point number: a further hyphen, or a parenthesis
+    // outside station mode, leaves it a radical that no range can be written
+    // with (it would take the place of a "*" first end).
+    const bool strangeSecond = range.second.Find('-') >= 0 || (!station && range.second.Find('(') >= 0);
+    if (strangeSecond || (a.radical != "*" && b.radical != "*" && a.radical != b.radical)) {
         ShowWarning(nullptr,
                     "Le groupe %s pr\xE9sent dans la cha\xEEne de s\xE9lection\n"
                     "pr\xE9sente des radicaux diff\xE9rents !",
@@ -86,7 +90,10 @@ bool CanonicalRange(const CString& group, int dash, CString& out) {
     else if (b.radical != "*")
         a.radical = b.radical;
     if (a.number < 0 || b.number < 0) {
+        // Normalised like a single group, so that the canonical string
+        // validates to itself (.* of an empty radical is written *).
         out = a.radical + ".*";
+        CCarnet::formMat(out);
         return true;
     }
     if (a.number > b.number) std::swap(a.number, b.number);
