@@ -136,7 +136,7 @@ int main(int argc, char** argv) {
     interpret->add_flag("--list", list, "List the drawing keywords and their codes");
 
     CLI::App* options = Subcommand(app, "options", "Print the option lines of a parameter location",
-                                   "carnet options --params HKEY_CURRENT_USER\\\\Software\\\\Carnet");
+                                   "carnet options --params 'HKEY_CURRENT_USER\\Software\\Carnet'");
     options->add_option("--params", params,
                         "A profile file, or a registry key such as HKEY_CURRENT_USER\\Software\\Carnet; the "
                         "defaults without it");
