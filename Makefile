@@ -47,5 +47,14 @@ bench: deps
 	./build/bench/bin/carnet_bench --benchmark_repetitions=3 --benchmark_out=build/bench/results.json --benchmark_out_format=json
 	python3 bench/ratios.py build/bench/results.json
 
+# Fuzzes each target for FUZZ_SECONDS (60 by default) and reports executions,
+# coverage and findings (fuzz/README.md); never part of `make test`, which
+# replays the seed corpora instead.
+FUZZ_SECONDS ?= 60
+fuzz: deps
+	cmake --preset fuzz >/dev/null
+	cmake --build --preset fuzz -j $(JOBS)
+	FUZZ_SECONDS=$(FUZZ_SECONDS) fuzz/run.sh
+
 clean:
 	rm -rf build

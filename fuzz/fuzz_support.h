@@ -42,8 +42,8 @@ inline std::string Shown(std::string_view s) {
 }
 
 // The folder every target works in, made once per process in memory when
-// the machine offers it (the stores sync each file they write), and removed
-// at exit.
+// the machine offers it (the stores sync each file they write), or under
+// $CARNET_FUZZ_SCRATCH, and removed at exit.
 class Scratch {
 public:
     static Scratch& Get() {
@@ -76,8 +76,14 @@ public:
 private:
     Scratch() {
         std::error_code ec;
-        const std::filesystem::path base =
+        std::filesystem::path base =
             std::filesystem::is_directory("/dev/shm", ec) ? "/dev/shm" : std::filesystem::temp_directory_path(ec);
+        // A run that aborts on a finding cannot clean up: fuzz/run.sh names
+        // a folder of its own and removes it afterwards.
+        if (const char* chosen = std::getenv("CARNET_FUZZ_SCRATCH"); chosen && *chosen) {
+            base = chosen;
+            std::filesystem::create_directories(base, ec);
+        }
         std::string pattern = (base / "carnet-fuzz-XXXXXX").string();
         if (!::mkdtemp(&pattern[0])) Broken("no scratch folder", __FILE__, __LINE__, pattern + "\n");
         m_dir = pattern;
