@@ -9,6 +9,7 @@
 #include <carnet/ccarnet.h>
 #include <carnet/code.h>
 #include <carnet/drawing.h>
+#include <carnet/reference.h>
 
 #include "book.h"
 #include "sizes.h"
@@ -48,6 +49,21 @@ void BM_FindForward(benchmark::State& state) {
     for (auto _ : state) benchmark::DoNotOptimize(book.Find(kMesure, np, 0, 0));
     if (book.Find(kMesure, np, 0, 0) != target) state.SkipWithError("the last measure was not found");
     Visited(state, target + 1);
+}
+
+// The limit of a lookup: the length of the number of every measure read, in
+// book order, with nothing compared. A large book does not fit in the
+// caches, so this is the cost of fetching the elements from memory.
+void BM_TouchMeasures(benchmark::State& state) {
+    CCarnet& book = *Book(static_cast<int>(state.range(0))).book;
+    const int count = book.length();
+    for (auto _ : state) {
+        long long sum = 0;
+        for (int i = 0; i < count; ++i)
+            if (book.typAt(i) == kMesure) sum += static_cast<const CMesure*>(book.ptrAt(i))->Np().GetLength();
+        benchmark::DoNotOptimize(sum);
+    }
+    Visited(state, count);
 }
 
 // Backwards from the end to the first measure.
@@ -178,6 +194,7 @@ void BM_Interprete(benchmark::State& state) {
 }
 
 BENCHMARK(BM_FindForward)->Apply(bench::BookSizes)->Unit(benchmark::kMicrosecond);
+BENCHMARK(BM_TouchMeasures)->Apply(bench::BookSizes)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_FindBackward)->Apply(bench::BookSizes)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_HasPnt)->Apply(bench::BookSizes)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_FindRepAtEveryStation)->Arg(10000)->Arg(100000)->Unit(benchmark::kMillisecond);

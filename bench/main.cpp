@@ -1,18 +1,22 @@
 // The benchmark program. Started as `carnet_bench --measure-load FILE` it is
 // the child of the memory benchmark instead: it loads the file and prints
 // its resident size before the load, its peak and its size after it (KiB),
-// and the number of elements loaded.
+// and the number of elements loaded. `carnet_bench --write-book N FILE`
+// writes the generated book of N elements, for a profiler to load.
 #include <benchmark/benchmark.h>
 
 #include <unistd.h>
 
 #include <cstdio>
+#include <cstdlib>
 #include <cstring>
 #include <fstream>
 #include <string>
 
 #include <carnet/ccarnet.h>
 
+#include "book.h"
+#include "check.h"
 #include "sizes.h"
 
 namespace {
@@ -51,6 +55,13 @@ std::string bench::SelfPath() {
 
 int main(int argc, char** argv) {
     if (argc == 3 && std::strcmp(argv[1], "--measure-load") == 0) return MeasureLoad(argv[2]);
+    if (argc == 4 && std::strcmp(argv[1], "--write-book") == 0) {
+        CCarnet book;
+        bench::GenerateBook(book, std::atoi(argv[2]));
+        bench::WriteFile(argv[3], bench::ToMemory([&](std::FILE* f) { book.Write(f, 1); }));
+        return 0;
+    }
+    if (!bench::CheckLookups()) return 1;
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
     benchmark::RunSpecifiedBenchmarks();

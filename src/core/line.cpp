@@ -1,6 +1,7 @@
 #include "core/line_internal.h"
 
 #include <cstring>
+#include <string>
 
 #include <carnet/numconv.h>
 
@@ -51,7 +52,17 @@ void Emit(CNorvexTxtWnd* wnd, int n, const CString& line) {
 
 void Emit(std::FILE* f, int n, const CString& line) {
     if (!f) return;
-    if (n > 0) std::fprintf(f, "%06d  ", n);
+    if (n > 0) {
+        // "%06d  ", without a format to parse on every line of a book.
+        thread_local std::string prefix;
+        if (n < 1000000) {
+            prefix.assign("000000  ");
+            for (int k = 5, v = n; v > 0; --k, v /= 10) prefix[static_cast<size_t>(k)] = static_cast<char>('0' + v % 10);
+        } else {
+            prefix = numconv::Format("%06d  ", n);
+        }
+        std::fwrite(prefix.data(), 1, prefix.size(), f);
+    }
     std::fwrite(line.GetString(), 1, static_cast<size_t>(line.GetLength()), f);
     std::fputc('\n', f);
 }

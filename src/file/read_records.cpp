@@ -25,12 +25,32 @@ CString SymbolWord(const ReadContext& ctx, size_t i) {
 
 bool HasDot(std::string_view w) { return w.find('.') != std::string_view::npos; }
 
+// Digits with one point (at `dot`) between them, no leading zero before it
+// but a lone one, and at most 15 significant digits: such a text is what
+// printing its own value with as many decimals gives back, since a double
+// keeps any 15 significant digits through a conversion and back. This
+// spares the printing for the coordinates a writer makes; any other text
+// takes the full test.
+bool IsPlainDecimal(std::string_view w, size_t dot) {
+    if (dot == 0 || dot + 1 >= w.size() || w.size() - dot - 1 > 290) return false;
+    if (w[0] == '0' && dot > 1) return false;
+    int significant = 0;
+    for (size_t i = 0; i < w.size(); ++i) {
+        if (i == dot) continue;
+        const char c = w[i];
+        if (c < '0' || c > '9') return false;
+        if (significant > 0 || c != '0') ++significant;
+    }
+    return significant <= 15;
+}
+
 // A coordinate word of a Point line: one optional sign, a decimal point, and
 // a text that prints back exactly with as many decimals as it has.
 bool IsCoordinate(std::string_view w) {
     if (!w.empty() && (w[0] == '+' || w[0] == '-')) w.remove_prefix(1);
     const size_t dot = w.find('.');
     if (dot == std::string_view::npos) return false;
+    if (IsPlainDecimal(w, dot)) return true;
     const int decimals = static_cast<int>(w.size() - dot - 1);
     return numconv::Format("%.*f", decimals, numconv::Atof(w)) == w;
 }

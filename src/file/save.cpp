@@ -1,12 +1,12 @@
 // Saving a field book and keeping a backup of its previous file. Whatever
 // goes wrong, a file on disk is either the old one or the complete new one:
-// the new bytes are prepared in memory and replace the file as a whole
-// (a device or a pipe, which cannot be replaced, is written to instead).
+// the new bytes go to a temporary file that then replaces the file as a
+// whole (a device or a pipe, which cannot be replaced, is written to
+// instead).
 #include <sys/stat.h>
 
 #include <cerrno>
 #include <cstdio>
-#include <cstdlib>
 #include <string>
 
 #include <carnet/ccarnet.h>
@@ -23,44 +23,43 @@ constexpr unsigned int kNewFileMode = 0666;
 
 int Failed(int err) { return err ? err : EIO; }
 
+using carnet_storefile::Filler;
+
 // Writes to something that is not a regular file (a terminal, a pipe,
 // /dev/null): it cannot be replaced, only written to.
-int WriteInPlace(const std::string& path, const std::string& data, bool append) {
+int WriteInPlace(const std::string& path, bool append, const Filler& fill) {
     std::FILE* f = std::fopen(path.c_str(), append ? "ab" : "wb");
     if (!f) return Failed(errno);
-    int err = 0;
-    if (std::fwrite(data.data(), 1, data.size(), f) != data.size()) err = Failed(errno);
+    int err = fill(f);
     if (std::fflush(f) != 0 && !err) err = Failed(errno);
+    if (std::ferror(f) && !err) err = EIO;
     if (std::fclose(f) != 0 && !err) err = Failed(errno);
     return err;
 }
 
-// Puts data in the file (after its present bytes when appending). A regular
-// or new file is replaced as a whole, keeping its permissions. Returns 0 or
-// an errno.
-int StoreBytes(const std::string& path, const std::string& data, bool append, unsigned int newMode) {
+// Puts the bytes that `fill` writes in the file (after its present bytes
+// when appending). A regular or new file is replaced as a whole, keeping its
+// permissions. Returns 0 or an errno.
+int StoreBytes(const std::string& path, bool append, unsigned int newMode, const Filler& fill) {
     struct stat st;
     const bool exists = ::stat(path.c_str(), &st) == 0;
-    if (exists && !S_ISREG(st.st_mode)) return WriteInPlace(path, data, append);
-    if (!exists || !append) return carnet_storefile::ReplaceAtomically(path, data, newMode);
-    std::string whole;
-    if (int err = carnet_storefile::ReadAll(path, whole)) return err;
-    whole += data;
-    return carnet_storefile::ReplaceAtomically(path, whole, newMode);
+    if (exists && !S_ISREG(st.st_mode)) return WriteInPlace(path, append, fill);
+    if (!exists || !append) return carnet_storefile::ReplaceAtomicallyWith(path, newMode, fill);
+    std::string previous;
+    if (int err = carnet_storefile::ReadAll(path, previous)) return err;
+    return carnet_storefile::ReplaceAtomicallyWith(path, newMode, [&](std::FILE* f) {
+        if (int err = carnet_storefile::WriteAllTo(f, previous)) return err;
+        return fill(f);
+    });
 }
 
-// The book as Write gives it, with lines numbered from 1.
-int WriteToMemory(CCarnet& book, std::string& out) {
-    char* buffer = nullptr;
-    size_t size = 0;
-    std::FILE* f = ::open_memstream(&buffer, &size);
-    if (!f) return Failed(errno);
-    book.Write(f, 1);
-    int err = std::ferror(f) ? EIO : 0;
-    if (std::fclose(f) != 0 && !err) err = Failed(errno);
-    if (!err) out.assign(buffer, size);
-    std::free(buffer);
-    return err;
+// The book as Write gives it, with lines numbered from 1, streamed to the
+// file as it is formatted.
+Filler BookLines(CCarnet& book) {
+    return [&book](std::FILE* f) {
+        book.Write(f, 1);
+        return std::ferror(f) ? Failed(errno) : 0;
+    };
 }
 
 // The backup sits beside the file: its last three characters become "sbk".
@@ -87,10 +86,7 @@ int CCarnet::Save(const CString& fileName, CWnd* pParent, bool bAppend) {
     if (given.IsEmpty() && !FileSave(m_FileName)) return 0;
     const CString path = given.IsEmpty() ? m_FileName : given;
 
-    std::string block;
-    int err = WriteToMemory(*this, block);
-    if (!err) err = StoreBytes(path.str(), block, bAppend, kNewFileMode);
-    if (err) {
+    if (StoreBytes(path.str(), bAppend, kNewFileMode, BookLines(*this)) != 0) {
         // A failed save leaves the book naming the file it was loaded from.
         m_FileName = previous;
         ShowWarning(pParent, carnet_texts::kCannotSave, path.GetString());
@@ -117,5 +113,6 @@ void CCarnet::BackUp() {
     std::string data;
     if (carnet_storefile::ReadAll(m_FileName.str(), data) != 0) return;
     // A new backup is no more readable by others than the file it copies.
-    StoreBytes(BackUpName(m_FileName.str()), data, false, st.st_mode & 0777);
+    StoreBytes(BackUpName(m_FileName.str()), false, st.st_mode & 0777,
+               [&data](std::FILE* f) { return carnet_storefile::WriteAllTo(f, data); });
 }

@@ -5,6 +5,7 @@
 #include <cstring>
 #include <clocale>
 #include <cstdio>
+#include <cstdint>
 #include <cstdlib>
 #include <locale.h>
 
@@ -37,6 +38,36 @@ double Atof(const char* s) {
     return Atof(std::string_view(s));
 }
 
+namespace {
+
+// Powers of ten that a double holds exactly.
+constexpr double kExactPowers[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7,  1e8,  1e9,  1e10, 1e11,
+                                   1e12, 1e13, 1e14, 1e15, 1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
+
+// The digits of a number as one integer, as long as they fit.
+class Mantissa {
+public:
+    void Add(char c) {
+        if (m_value == 0 && c == '0') return;  // leading zeros carry no digit
+        if (++m_digits <= 19) m_value = m_value * 10 + static_cast<std::uint64_t>(c - '0');
+    }
+    // value * 10^exponent when a double holds both the digits and the power
+    // exactly: one multiplication or division then rounds the true value
+    // once, which is exactly what the general conversion gives.
+    bool Convert(int exponent, double& value) const {
+        if (m_digits > 19 || m_value > (std::uint64_t{1} << 53) || exponent < -22 || exponent > 22) return false;
+        const double m = static_cast<double>(m_value);
+        value = exponent < 0 ? m / kExactPowers[-exponent] : m * kExactPowers[exponent];
+        return true;
+    }
+
+private:
+    std::uint64_t m_value = 0;
+    int m_digits = 0;
+};
+
+}  // namespace
+
 double Atof(std::string_view text) {
     const char* p = text.data();
     const char* const end = p + text.size();
@@ -45,28 +76,44 @@ double Atof(std::string_view text) {
     bool negative = false;
     if (p < end && (*p == '+' || *p == '-')) negative = (*p++ == '-');
     const char* start = p;
-    while (digit(p)) ++p;
+    Mantissa mantissa;
+    while (digit(p)) mantissa.Add(*p++);
     bool any = p > start;
+    int exponent = 0;
     if (p < end && *p == '.') {
         const char* frac = ++p;
-        while (digit(p)) ++p;
+        while (digit(p)) mantissa.Add(*p++);
         any = any || p > frac;
+        exponent = -static_cast<int>(p - frac);
     }
     if (!any) return 0.0;
     if (p < end && (*p == 'e' || *p == 'E')) {
         const char* q = p + 1;
-        if (q < end && (*q == '+' || *q == '-')) ++q;
+        bool negativeExponent = false;
+        if (q < end && (*q == '+' || *q == '-')) negativeExponent = (*q++ == '-');
         const char* exp = q;
-        while (digit(q)) ++q;
-        if (q > exp) p = q;
+        int written = 0;
+        while (digit(q)) {
+            // Beyond four digits the number is far outside the short way.
+            if (q - exp < 4) written = written * 10 + (*q - '0');
+            ++q;
+        }
+        if (q > exp) {
+            p = q;
+            exponent = q - exp > 4 ? 1000 : exponent + (negativeExponent ? -written : written);
+        }
     }
-    // Only the validated decimal prefix is converted, so no special form
-    // ("inf", "nan", hexadecimal) can be read.
     double value = 0.0;
-    auto result = std::from_chars(start, p, value, std::chars_format::general);
-    if (result.ec == std::errc::result_out_of_range) {
-        // Rare: let the C library pick infinity or zero, as atof does.
-        value = strtod_l(std::string(start, p).c_str(), nullptr, CLocale());
+    // Most numbers of a field book take the short way; the others, and the
+    // limits of the range, go through the general conversion of the
+    // validated decimal prefix only, so no special form ("inf", "nan",
+    // hexadecimal) can be read.
+    if (!mantissa.Convert(exponent, value)) {
+        auto result = std::from_chars(start, p, value, std::chars_format::general);
+        if (result.ec == std::errc::result_out_of_range) {
+            // Rare: let the C library pick infinity or zero, as atof does.
+            value = strtod_l(std::string(start, p).c_str(), nullptr, CLocale());
+        }
     }
     return negative ? -value : value;
 }
@@ -92,23 +139,27 @@ int Atoi(const char* s) {
 void AppendFormatV(std::string& out, const char* format, va_list args) {
     if (!format) return;
     CLocaleScope scope;
-    // Try in the string's own spare room first, grow once when it is short.
-    const size_t base = out.size();
-    size_t room = 64;
-    out.resize(base + room);
+    // Formatted first in a scratch text of the thread that keeps its size
+    // from one call to the next, so that nothing is cleared or allocated on
+    // each call; a longer text makes it grow to fit and is formatted again.
+    // The arguments may point into `out`, which is only appended to at the end.
+    thread_local std::string scratch(256, '\0');
     va_list copy;
     va_copy(copy, args);
-    int n = std::vsnprintf(&out[base], room, format, copy);
+    const int n = std::vsnprintf(&scratch[0], scratch.size(), format, copy);
     va_end(copy);
-    if (n < 0) {
-        out.resize(base);
-        return;
+    if (n < 0) return;
+    const size_t length = static_cast<size_t>(n);
+    if (length >= scratch.size()) {
+        scratch.resize(length + 1);
+        std::vsnprintf(&scratch[0], scratch.size(), format, args);
     }
-    if (static_cast<size_t>(n) >= room) {
-        out.resize(base + static_cast<size_t>(n) + 1);
-        std::vsnprintf(&out[base], static_cast<size_t>(n) + 1, format, args);
+    out.append(scratch.data(), length);
+    // A rare long text does not keep its room for the rest of the thread.
+    if (scratch.size() > (1u << 16)) {
+        scratch.assign(256, '\0');
+        scratch.shrink_to_fit();
     }
-    out.resize(base + static_cast<size_t>(n));
 }
 
 std::string Format(const char* format, ...) {

@@ -44,21 +44,6 @@ mode_t CurrentUmask() {
     return mask;
 }
 
-int WriteAllTo(int fd, const std::string& data) {
-    const char* p = data.data();
-    size_t left = data.size();
-    while (left > 0) {
-        ssize_t n = ::write(fd, p, left);
-        if (n < 0) {
-            if (errno == EINTR) continue;
-            return Fail(errno);
-        }
-        p += n;
-        left -= static_cast<size_t>(n);
-    }
-    return 0;
-}
-
 // The file a write must replace: the target of a symbolic link, so that the
 // link itself survives.
 int ResolveTarget(const std::string& path, std::string& target) {
@@ -103,7 +88,7 @@ int ReadAll(const std::string& path, std::string& out) {
     return 0;
 }
 
-int ReplaceAtomically(const std::string& path, const std::string& data, unsigned int newMode) {
+int ReplaceAtomicallyWith(const std::string& path, unsigned int newMode, const Filler& fill) {
     if (path.empty()) return ENOENT;
     std::string target;
     if (int err = ResolveTarget(path, target)) return err;
@@ -123,9 +108,19 @@ int ReplaceAtomically(const std::string& path, const std::string& data, unsigned
     } else if (::fchmod(fd, static_cast<mode_t>(newMode) & ~CurrentUmask() & 07777) != 0) {
         err = Fail(errno);
     }
-    if (!err) err = WriteAllTo(fd, data);
-    if (!err && ::fsync(fd) != 0) err = Fail(errno);
-    if (::close(fd) != 0 && !err) err = Fail(errno);
+    std::FILE* f = err ? nullptr : ::fdopen(fd, "wb");
+    if (f) {
+        // Large writes: the stream goes to the disk in few calls.
+        std::setvbuf(f, nullptr, _IOFBF, 1 << 16);
+        err = fill(f);
+        if (!err && std::fflush(f) != 0) err = Fail(errno);
+        if (!err && std::ferror(f)) err = EIO;
+        if (!err && ::fsync(fd) != 0) err = Fail(errno);
+        if (std::fclose(f) != 0 && !err) err = Fail(errno);
+    } else {
+        if (!err) err = Fail(errno);
+        ::close(fd);
+    }
     if (!err && ::rename(temp.c_str(), target.c_str()) != 0) err = Fail(errno);
     if (err) {
         ::unlink(temp.c_str());
@@ -139,6 +134,15 @@ int ReplaceAtomically(const std::string& path, const std::string& data, unsigned
         ::close(dir);
     }
     return 0;
+}
+
+int WriteAllTo(std::FILE* f, const std::string& data) {
+    if (std::fwrite(data.data(), 1, data.size(), f) != data.size()) return Fail(errno);
+    return 0;
+}
+
+int ReplaceAtomically(const std::string& path, const std::string& data, unsigned int newMode) {
+    return ReplaceAtomicallyWith(path, newMode, [&data](std::FILE* f) { return WriteAllTo(f, data); });
 }
 
 int MakeFolders(const std::string& path, unsigned int mode) {

@@ -1,37 +1,158 @@
 #include <carnet/ccarnet.h>
 
+#include <cstring>
+
+#include <carnet/chemin.h>
+#include <carnet/lecture.h>
+#include <carnet/point.h>
+#include <carnet/reference.h>
+#include <carnet/station.h>
+
 #include "points/element_access_internal.h"
 
 using carnet_query::PointNumber;
 
+namespace {
+
+// How many elements of the wanted type a named search asks for before it
+// reads them. A large book does not fit in the caches and every element of
+// the type must be read, so their memory is requested well in advance; the
+// type codes alone tell which ones will be needed.
+constexpr int kAhead = 16;
+// Type codes are examined in blocks of this many, with no branch per code.
+constexpr int kBlock = 8;
+
+// The named search over the elements of one class. A cursor runs ahead
+// through the type codes, queues the indexes of the elements of the type and
+// prefetches them; the search then reads each queued element in turn. The
+// number is read in place through the class itself (no call per element),
+// and its length is compared before its bytes.
+template <class T>
+class NamedScan {
+public:
+    NamedScan(const std::uint32_t* types, void* const* elements, unsigned int type, const std::string& wanted)
+        : m_types(types), m_elements(elements), m_type(type), m_wanted(wanted.data()), m_size(wanted.size()) {}
+
+    // From first up to last, both included.
+    int Forward(int first, int last) {
+        int next = first;
+        for (;;) {
+            while (m_count < kAhead && next <= last) {
+                if (last - next + 1 >= kBlock) {
+                    unsigned int mask = 0;
+                    for (int k = 0; k < kBlock; ++k) mask |= static_cast<unsigned int>(m_types[next + k] == m_type) << k;
+                    for (; mask; mask &= mask - 1) Queue(next + __builtin_ctz(mask));
+                    next += kBlock;
+                } else {
+                    if (m_types[next] == m_type) Queue(next);
+                    ++next;
+                }
+            }
+            if (m_count == 0) return -1;
+            const int i = Dequeue();
+            if (Matches(i)) return i;
+        }
+    }
+
+    // From first down to 0, both included.
+    int Backward(int first) {
+        int next = first;
+        for (;;) {
+            while (m_count < kAhead && next >= 0) {
+                if (next + 1 >= kBlock) {
+                    unsigned int mask = 0;
+                    for (int k = 0; k < kBlock; ++k) mask |= static_cast<unsigned int>(m_types[next - k] == m_type) << k;
+                    for (; mask; mask &= mask - 1) Queue(next - __builtin_ctz(mask));
+                    next -= kBlock;
+                } else {
+                    if (m_types[next] == m_type) Queue(next);
+                    --next;
+                }
+            }
+            if (m_count == 0) return -1;
+            const int i = Dequeue();
+            if (Matches(i)) return i;
+        }
+    }
+
+private:
+    // A block may queue up to kBlock indexes past kAhead.
+    static constexpr int kRing = 32;
+    static_assert(kRing >= kAhead + kBlock && (kRing & (kRing - 1)) == 0, "a ring of a power of two");
+
+    void Queue(int i) {
+        if (const T* e = static_cast<const T*>(m_elements[i])) __builtin_prefetch(&e->Np());
+        m_ring[(m_head + m_count++) & (kRing - 1)] = i;
+    }
+
+    int Dequeue() {
+        const int i = m_ring[m_head];
+        m_head = (m_head + 1) & (kRing - 1);
+        --m_count;
+        return i;
+    }
+
+    bool Matches(int i) const {
+        const T* e = static_cast<const T*>(m_elements[i]);
+        if (!e) return false;
+        // Numbers of a run share their beginning: the last byte tells most
+        // of them apart before the others are compared.
+        const std::string& np = e->Np().str();
+        if (np.size() != m_size) return false;
+        return m_size == 0 || (np[m_size - 1] == m_wanted[m_size - 1] && std::memcmp(np.data(), m_wanted, m_size) == 0);
+    }
+
+    const std::uint32_t* m_types;
+    void* const* m_elements;
+    unsigned int m_type;
+    const char* m_wanted;
+    size_t m_size;
+    int m_ring[kRing];
+    int m_head = 0;
+    int m_count = 0;
+};
+
+template <class T>
+int Scan(const std::uint32_t* types, void* const* elements, unsigned int type, const std::string& wanted, int first,
+         int last, bool backwards) {
+    NamedScan<T> scan(types, elements, type, wanted);
+    return backwards ? scan.Backward(first) : scan.Forward(first, last);
+}
+
+}  // namespace
+
 int CCarnet::Find(unsigned int type, const CString& np, int first, int end) const {
-    const bool any = np.IsEmpty();
-    // Only types 1001 to 1007 carry a point number: a named search can match
-    // nothing else. The number is compared in place, with no copy per element.
-    const ElementOps* ops = type >= 1001 && type <= 1007 ? ElementOpsFor(type) : nullptr;
-    if (!any && !(ops && ops->np)) return -1;
-    const std::string& wanted = np.str();
+    const bool backwards = end < 0;
+    const int last = backwards ? 0 : (end == 0 ? length() - 1 : end);
+    if (backwards ? first < 0 : first > last) return -1;
+    assert(backwards ? first < length() : first >= 0 && last < length());
     const std::uint32_t* types = m_Types.GetData();
     void* const* elements = m_Elements.GetData();
-    auto matches = [&](int i) {
-        if (types[i] != type) return false;
-        if (any) return true;
-        const void* p = elements[i];
-        return p && ops->np(p)->str() == wanted;
-    };
-    if (end < 0) {
-        if (first < 0) return -1;
-        assert(first < length());
-        for (int i = first; i >= 0; --i)
-            if (matches(i)) return i;
+
+    if (np.IsEmpty()) {
+        // Every element of the type matches: only the type codes are read.
+        if (backwards) {
+            for (int i = first; i >= 0; --i)
+                if (types[i] == type) return i;
+        } else {
+            for (int i = first; i <= last; ++i)
+                if (types[i] == type) return i;
+        }
         return -1;
     }
-    const int last = end == 0 ? length() - 1 : end;
-    if (first > last) return -1;
-    assert(first >= 0 && last < length());
-    for (int i = first; i <= last; ++i)
-        if (matches(i)) return i;
-    return -1;
+    // Only types 1001 to 1007 carry a point number: a named search can match
+    // nothing else.
+    const std::string& wanted = np.str();
+    switch (type) {
+        case 1001: return Scan<CStation>(types, elements, type, wanted, first, last, backwards);
+        case 1002: return Scan<CReference>(types, elements, type, wanted, first, last, backwards);
+        case 1003: return Scan<CMesure>(types, elements, type, wanted, first, last, backwards);
+        case 1004: return Scan<CLectAR>(types, elements, type, wanted, first, last, backwards);
+        case 1005: return Scan<CLectAV>(types, elements, type, wanted, first, last, backwards);
+        case 1006: return Scan<CPointGen>(types, elements, type, wanted, first, last, backwards);
+        case 1007: return Scan<CChemin>(types, elements, type, wanted, first, last, backwards);
+        default: return -1;
+    }
 }
 
 CString CCarnet::cmdAt(int i) {

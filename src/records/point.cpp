@@ -3,6 +3,7 @@
 #include <carnet/numconv.h>
 
 #include "core/line_internal.h"
+#include "records/record_internal.h"
 
 int CPointGen::m_DeciXY = 4;
 int CPointGen::m_DeciZ = 4;
@@ -86,15 +87,5 @@ void CPointGen::Infos(CString& out) {
     out.AppendFormat(" %1.1d %14.6f %14.6f %12.6f %s", LockCode(), m_X, m_Y, m_Z, m_Sy.GetString());
 }
 
-void CPointGen::Print(CNorvexTxtWnd* wnd, int n) {
-    if (!wnd) return;
-    CString line;
-    Infos(line);
-    carnet_line::Emit(wnd, n, line);
-}
-
-void CPointGen::Write(std::FILE* f, int n) {
-    CString line;
-    Infos(line);
-    carnet_line::Emit(f, n, line);
-}
+void CPointGen::Print(CNorvexTxtWnd* wnd, int n) { carnet_record::PrintLine(*this, wnd, n); }
+void CPointGen::Write(std::FILE* f, int n) { carnet_record::WriteLine(*this, f, n); }

@@ -5,6 +5,11 @@
 
 namespace carnet_record {
 
+CString& LineBuffer() {
+    thread_local CString line;
+    return line;
+}
+
 void AppendItem(CString& out, const char* label, int decimals, int extraWidth, double v) {
     const int d = numconv::SafeDecimals(decimals);
     if (!out.IsEmpty()) out += " , ";

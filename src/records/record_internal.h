@@ -43,9 +43,13 @@ void PrintLine(R& record, CNorvexTxtWnd* wnd, int n) {
     carnet_line::Emit(wnd, n, line);
 }
 
+// The text in which the writers build each line, kept from one line to the
+// next (one per thread), so that writing a book allocates nothing per line.
+CString& LineBuffer();
+
 template <class R>
 void WriteLine(R& record, std::FILE* f, int n) {
-    CString line;
+    CString& line = LineBuffer();
     record.Infos(line);
     carnet_line::Emit(f, n, line);
 }

@@ -48,10 +48,15 @@ void CReference::Params(CString& out) const {
 void CReference::InfosAs(CString& out, unsigned int typeCode) {
     using numconv::SafeDecimals;
     carnet_record::StartLine(out, typeCode, m_Np);
-    carnet_record::AppendColumn(out, m_Hp, 9, 6, SafeDecimals(m_DeciZ) + 4);
-    carnet_record::AppendColumn(out, m_Ah, 11, 7, SafeDecimals(m_DeciAng) + 4);
-    carnet_record::AppendColumn(out, m_Av, 11, 7, SafeDecimals(m_DeciAng) + 4);
-    carnet_record::AppendColumn(out, m_Di, 10, 6, SafeDecimals(m_DeciXY) + 4);
+    if (!IsUndef(m_Hp) && !IsUndef(m_Ah) && !IsUndef(m_Av) && !IsUndef(m_Di)) {
+        // The usual complete observation: its four columns in one go.
+        out.AppendFormat(" %9.6f %11.7f %11.7f %10.6f", m_Hp, m_Ah, m_Av, m_Di);
+    } else {
+        carnet_record::AppendColumn(out, m_Hp, 9, 6, SafeDecimals(m_DeciZ) + 4);
+        carnet_record::AppendColumn(out, m_Ah, 11, 7, SafeDecimals(m_DeciAng) + 4);
+        carnet_record::AppendColumn(out, m_Av, 11, 7, SafeDecimals(m_DeciAng) + 4);
+        carnet_record::AppendColumn(out, m_Di, 10, 6, SafeDecimals(m_DeciXY) + 4);
+    }
     carnet_line::MarkSpaces(m_Sy);  // the mark stays in the record
     out += ' ';
     out += m_Sy;

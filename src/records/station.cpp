@@ -1,5 +1,7 @@
 #include <carnet/station.h>
 
+#include <string_view>
+
 #include <carnet/element_types.h>
 #include <carnet/numconv.h>
 
@@ -44,12 +46,13 @@ void CStation::Infos(CString& out) {
     carnet_record::StartLine(out, kStationType, m_Np);
     out.AppendFormat(" %9.6f ", m_Hi);
     // The file has no blank column for a missing orientation: -1 stands for it.
-    CString v0 = numconv::Format("%11.7f", IsUndef(m_V0) ? -1.0 : m_V0);
-    if (!IsUndef(m_V0) && numconv::Atof(v0) == 400.0) {
+    const size_t v0At = out.str().size();
+    out.AppendFormat("%11.7f", IsUndef(m_V0) ? -1.0 : m_V0);
+    if (!IsUndef(m_V0) && numconv::Atof(std::string_view(out.str()).substr(v0At)) == 400.0) {
         m_V0 = 0.0;  // a full circle is kept as 0
-        v0 = numconv::Format("%11.7f", m_V0);
+        out.str().resize(v0At);
+        out.AppendFormat("%11.7f", m_V0);
     }
-    out += v0;
     carnet_record::AppendBlanks(out, numconv::SafeDecimals(m_DeciZ) + numconv::SafeDecimals(m_DeciAng) + 11);
     carnet_line::MarkSpaces(m_Sy);  // the mark stays in the record
     out += m_Sy;
