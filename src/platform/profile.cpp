@@ -1,5 +1,7 @@
 #include <carnet/profile.h>
 
+#include <sys/stat.h>
+
 #include <cerrno>
 #include <vector>
 
@@ -142,12 +144,22 @@ bool EndsWithLineEnd(const std::string& text) {
     return !text.empty() && (text.back() == '\n' || text.back() == '\r');
 }
 
+// A profile is a regular file, or no file yet. Anything else named as one
+// is neither read (a device such as /dev/zero never ends) nor replaced (that
+// would remove a device such as /dev/null): 0, or the errno of the refusal.
+int RefusedStore(const std::string& path) {
+    struct stat st;
+    if (::stat(path.c_str(), &st) != 0 || S_ISREG(st.st_mode)) return 0;
+    return S_ISDIR(st.st_mode) ? EISDIR : EINVAL;
+}
+
 }  // namespace
 
 bool ProfileReadString(const char* file, const char* section, const char* key, std::string& value) {
     value.clear();
     std::string text;
-    if (carnet_storefile::ReadAll(file ? file : "", text) != 0) return false;
+    const std::string path(file ? file : "");
+    if (RefusedStore(path) != 0 || carnet_storefile::ReadAll(path, text) != 0) return false;
     std::vector<Line> lines = SplitLines(text);
     Place place = Locate(text, lines, Trimmed(section), Trimmed(key));
     if (place.key < 0) return false;
@@ -165,6 +177,7 @@ int ProfileWriteString(const char* file, const char* section, const char* key, c
         keyName.find('=') != std::string::npos || keyName[0] == '[' || keyName[0] == ';')
         return EINVAL;
 
+    if (int refused = RefusedStore(path)) return refused;
     std::string text;
     int err = carnet_storefile::ReadAll(path, text);
     if (err && err != ENOENT) return err;

@@ -18,11 +18,13 @@
 
 // Sets value and returns true when the file holds the entry; returns false
 // (value empty) when the file cannot be read or the section or the key is
-// missing. A null name reads as an empty one.
+// missing. A null name reads as an empty one. A name that is neither a
+// regular file nor missing (a folder, a device, a pipe) is not read.
 bool ProfileReadString(const char* file, const char* section, const char* key, std::string& value);
 
 // Writes the entry. Returns 0, or the errno of the failure; EINVAL for a
 // name or value that no line could hold (an empty name, a line break, a '='
-// in a key, a ']' in a section). A value that would not read back as written
+// in a key, a ']' in a section) and for a device or a pipe, which is never
+// replaced (EISDIR for a folder). A value that would not read back as written
 // (surrounding blanks, or quotes at both ends) is written between quotes.
 int ProfileWriteString(const char* file, const char* section, const char* key, const char* value);
