@@ -84,33 +84,28 @@ void* ReadStation(ReadContext& ctx) {
     return ctx.Store(new CStation(ctx.Word(0), ctx.Number(1), v0, n == 4 ? SymbolWord(ctx, 3) : CString()), 1001);
 }
 
-// The writer leaves an absent observation out of the line, so a value word
-// that reads as the absent value itself would be saved as a line of another
-// shape: such a line is refused like an incomplete one.
-bool ReadsAsAbsent(const ReadContext& ctx, size_t first, size_t last) {
-    for (size_t i = first; i <= last; ++i)
-        if (IsUndef(ctx.Number(i))) return true;
-    return false;
-}
-
 void* ReadObservation(ReadContext& ctx, unsigned int code) {
     const size_t n = ctx.WordCount();
-    if ((n == 2 || n == 3) && ReadsAsAbsent(ctx, 1, 1)) return ctx.Incomplete();
-    if ((n == 5 || n == 6) && ReadsAsAbsent(ctx, 1, 4)) return ctx.Incomplete();
-    CReference* r = nullptr;
+    // 2 or 3 words: the name, AH and perhaps the symbol; 5 or 6 words: the
+    // name, HP, AH, AV, DI and perhaps the symbol.
+    const size_t count = n == 2 || n == 3 ? 1 : (n == 5 || n == 6 ? 4 : 0);
+    if (count == 0) return ctx.Incomplete();
+    double values[4];
+    for (size_t i = 0; i < count; ++i) {
+        values[i] = ctx.Number(i + 1);
+        // The writer leaves an absent observation out of the line, so a
+        // value word that reads as the absent value itself would be saved
+        // as a line of another shape: such a line is refused like an
+        // incomplete one.
+        if (IsUndef(values[i])) return ctx.Incomplete();
+    }
+    const CString sy = n == 3 || n == 6 ? SymbolWord(ctx, n - 1) : CString();
     auto make = [code](auto&&... args) -> CReference* {
         if (code == 1003) return new CMesure(args...);
         return new CReference(args...);
     };
-    switch (n) {
-        case 2: r = make(ctx.Word(0), ctx.Number(1), CString()); break;
-        case 3: r = make(ctx.Word(0), ctx.Number(1), SymbolWord(ctx, 2)); break;
-        case 5: r = make(ctx.Word(0), ctx.Number(1), ctx.Number(2), ctx.Number(3), ctx.Number(4), CString()); break;
-        case 6:
-            r = make(ctx.Word(0), ctx.Number(1), ctx.Number(2), ctx.Number(3), ctx.Number(4), SymbolWord(ctx, 5));
-            break;
-        default: return ctx.Incomplete();
-    }
+    CReference* r = count == 1 ? make(ctx.Word(0), values[0], sy)
+                               : make(ctx.Word(0), values[0], values[1], values[2], values[3], sy);
     return ctx.Store(r, code);
 }
 

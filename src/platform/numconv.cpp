@@ -44,45 +44,44 @@ namespace {
 constexpr double kExactPowers[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7,  1e8,  1e9,  1e10, 1e11,
                                    1e12, 1e13, 1e14, 1e15, 1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
 
-// The digits of a number as one integer, as long as they fit.
-class Mantissa {
-public:
-    void Add(char c) {
-        if (m_value == 0 && c == '0') return;  // leading zeros carry no digit
-        if (++m_digits <= 19) m_value = m_value * 10 + static_cast<std::uint64_t>(c - '0');
-    }
-    // value * 10^exponent when a double holds both the digits and the power
-    // exactly: one multiplication or division then rounds the true value
-    // once, which is exactly what the general conversion gives.
-    bool Convert(int exponent, double& value) const {
-        if (m_digits > 19 || m_value > (std::uint64_t{1} << 53) || exponent < -22 || exponent > 22) return false;
-        const double m = static_cast<double>(m_value);
-        value = exponent < 0 ? m / kExactPowers[-exponent] : m * kExactPowers[exponent];
-        return true;
-    }
+// value * 10^exponent when a double holds both the digits (as an integer of
+// at most 19 significant digits) and the power exactly: one multiplication
+// or division then rounds the true value once, which is exactly what the
+// general conversion gives.
+bool ConvertShort(std::uint64_t digits, int significant, int exponent, double& value) {
+    if (significant > 19 || digits > (std::uint64_t{1} << 53) || exponent < -22 || exponent > 22) return false;
+    const double m = static_cast<double>(digits);
+    value = exponent < 0 ? m / kExactPowers[-exponent] : m * kExactPowers[exponent];
+    return true;
+}
 
-private:
-    std::uint64_t m_value = 0;
-    int m_digits = 0;
-};
+bool IsDigitChar(char c) { return cp1252::IsDigit(static_cast<unsigned char>(c)); }
 
 }  // namespace
 
 double Atof(std::string_view text) {
     const char* p = text.data();
     const char* const end = p + text.size();
-    auto digit = [&](const char* q) { return q < end && cp1252::IsDigit(static_cast<unsigned char>(*q)); };
     while (p < end && cp1252::IsSpace(static_cast<unsigned char>(*p))) ++p;
     bool negative = false;
     if (p < end && (*p == '+' || *p == '-')) negative = (*p++ == '-');
-    const char* start = p;
-    Mantissa mantissa;
-    while (digit(p)) mantissa.Add(*p++);
+    const char* const start = p;
+    // The digits as one integer (it wraps beyond 19 significant digits,
+    // which are then left to the general conversion).
+    std::uint64_t digits = 0;
+    while (p < end && *p == '0') ++p;
+    const char* first = p;
+    while (p < end && IsDigitChar(*p)) digits = digits * 10 + static_cast<std::uint64_t>(*p++ - '0');
+    int significant = static_cast<int>(p - first);
     bool any = p > start;
     int exponent = 0;
     if (p < end && *p == '.') {
         const char* frac = ++p;
-        while (digit(p)) mantissa.Add(*p++);
+        if (significant == 0)
+            while (p < end && *p == '0') ++p;  // zeros before the first significant digit
+        first = p;
+        while (p < end && IsDigitChar(*p)) digits = digits * 10 + static_cast<std::uint64_t>(*p++ - '0');
+        significant += static_cast<int>(p - first);
         any = any || p > frac;
         exponent = -static_cast<int>(p - frac);
     }
@@ -93,7 +92,7 @@ double Atof(std::string_view text) {
         if (q < end && (*q == '+' || *q == '-')) negativeExponent = (*q++ == '-');
         const char* exp = q;
         int written = 0;
-        while (digit(q)) {
+        while (q < end && IsDigitChar(*q)) {
             // Beyond four digits the number is far outside the short way.
             if (q - exp < 4) written = written * 10 + (*q - '0');
             ++q;
@@ -108,7 +107,7 @@ double Atof(std::string_view text) {
     // limits of the range, go through the general conversion of the
     // validated decimal prefix only, so no special form ("inf", "nan",
     // hexadecimal) can be read.
-    if (!mantissa.Convert(exponent, value)) {
+    if (!ConvertShort(digits, significant, exponent, value)) {
         auto result = std::from_chars(start, p, value, std::chars_format::general);
         if (result.ec == std::errc::result_out_of_range) {
             // Rare: let the C library pick infinity or zero, as atof does.
