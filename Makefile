@@ -3,7 +3,7 @@
 JOBS ?= $(shell nproc)
 DEB_PACKAGES := cmake ninja-build g++ clang libgtest-dev libgmock-dev libcli11-dev libbenchmark-dev locales python3 libdxflib-dev python3-ezdxf
 
-.PHONY: all deps build run test test-release test-asan bench fuzz clean
+.PHONY: all deps build run test test-release test-asan bench fuzz lint clean
 
 all: build
 
@@ -55,6 +55,17 @@ fuzz: deps
 	cmake --preset fuzz >/dev/null
 	cmake --build --preset fuzz -j $(JOBS)
 	FUZZ_SECONDS=$(FUZZ_SECONDS) fuzz/run.sh
+
+# Static checks of the library, both silent on a clean tree: clang-tidy with
+# the checks of src/.clang-tidy (likely bugs, needless costs, the analyzer),
+# and cppcheck's warnings, performance and portability checks.
+LINT_PACKAGES := clang-tidy cppcheck
+lint: deps
+	@$(MAKE) --no-print-directory deps DEB_PACKAGES="$(LINT_PACKAGES)"
+	cmake -S . -B build/lint -G Ninja -DCMAKE_CXX_COMPILER=clang++ -DCARNET_BUILD_TESTS=OFF -DCARNET_BUILD_TOOL=OFF >/dev/null
+	run-clang-tidy -p build/lint -j $(JOBS) -quiet '$(CURDIR)/src/.*\.cpp$$'
+	cppcheck --enable=warning,performance,portability --std=c++17 --language=c++ --inline-suppr --quiet \
+	  --error-exitcode=1 -j $(JOBS) -I src -I build/lint/include src
 
 clean:
 	rm -rf build

@@ -50,7 +50,7 @@ const char* RegistryRoot(const char* location, std::string& keyPath) {
 }
 
 std::string KeyOf(const std::string& keyPath, const char* section) {
-    const std::string name(section ? section : "");
+    std::string name(section ? section : "");
     if (keyPath.empty()) return name;
     if (name.empty()) return keyPath;
     return keyPath + "\\" + name;

@@ -83,8 +83,9 @@ void CChemin::getAt(int i, CString& mat, int& rep) const {
 }
 
 int CChemin::add(const CString& mat, int rep) {
-    // Copied first: `mat` may be one of this path's own entries.
-    const CString copy(mat);
+    // Copied first: `mat` may be one of this path's own entries, which the
+    // array moves when it grows.
+    const CString copy(mat);  // NOLINT(performance-unnecessary-copy-initialization)
     m_Reps.Add(rep);
     return m_Mats.Add(copy);
 }
@@ -106,7 +107,7 @@ int CChemin::add(CStation* station, CCarnet* book) {
 
 CChemin& CChemin::insertAt(int i, const CString& mat, int rep) {
     assert(i >= 0);
-    const CString copy(mat);
+    const CString copy(mat);  // NOLINT(performance-unnecessary-copy-initialization): as in add
     m_Mats.InsertAt(i, copy);
     m_Reps.InsertAt(i, rep);
     return *this;
