@@ -392,6 +392,8 @@ const Case kCases[] = {
      {}},
     {"an export that cannot be written leaves nothing", "export $EX --to svg -o $W/absent/c.svg", {}, 2, "",
      "$W/absent/c.svg: cannot write: No such file or directory\n", {}},
+    {"an export to a full disk says so", "export $EX --to dxf -o /dev/full", {}, 2, "",
+     "/dev/full: cannot write: No space left on device; nothing written\n", {}},
     {"no subcommand prints the help", "", {}, 0, "carnet: inspect, query, convert and export land-surveying field books (.geo files)\n...\n", "", {}},
     {"a usage error", "export $EX --to pdf", {}, 2, "",
      "carnet: --to: pdf not in {csv,geojson,dxf,svg}\ncarnet --help tells how to use it\n", {}},

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <cstdlib>
 #include <cstring>
 #include <fstream>
 #include <iterator>
@@ -114,7 +115,7 @@ int ReadInput(const std::string& path, std::string& cp1252, bool& converted) {
 
 bool FromTerminal(const std::string& what, const std::string& arg, std::string& cp1252) {
     size_t bad = 0;
-    if (CurrentSession().input == Encoding::Cp1252 || !HasHighBytes(arg) || !IsUtf8(arg, bad)) {
+    if (!HasHighBytes(arg) || !IsUtf8(arg, bad)) {
         cp1252 = arg;
         return true;
     }
@@ -157,32 +158,48 @@ int LoadBook(const std::string& path, CCarnet& book, int& rejected) {
 
 int WriteOutput(const std::string& target, const std::function<bool(const std::string& path)>& write) {
     const std::string where = target.empty() ? std::string("standard output") : target;
-    // Beside the target, so that the finished file takes its place in one step.
-    std::string temp = target.empty() ? CurrentSession().store.PathOf("output-XXXXXX") : target + ".XXXXXX";
+    // A link is followed, so that the file it names is replaced, not the link.
+    std::string file = target;
+    struct stat st;
+    if (!file.empty() && ::lstat(file.c_str(), &st) == 0 && S_ISLNK(st.st_mode)) {
+        if (char* real = ::realpath(file.c_str(), nullptr)) {
+            file = real;
+            std::free(real);
+        }
+    }
+    // Standard output, a device or a pipe cannot be replaced: the output is
+    // made in the scratch folder and then copied into it.
+    const bool stream =
+        file.empty() || (::stat(file.c_str(), &st) == 0 && !S_ISREG(st.st_mode) && !S_ISDIR(st.st_mode));
+    // Otherwise beside the target, so that the finished file takes its place
+    // in one step.
+    std::string temp = stream ? CurrentSession().store.PathOf("output-XXXXXX") : file + ".XXXXXX";
     const int fd = ::mkstemp(&temp[0]);
     if (fd < 0) {
         Say(where, std::string("cannot write: ") + std::strerror(errno));
         return kUnreadable;
     }
     ::close(fd);
+    errno = 0;
     bool ok = write(temp);
-    if (ok && target.empty()) {
-        std::ifstream in(temp, std::ios::binary);
+    if (ok && stream) {
         std::fflush(stdout);
+        std::FILE* out = file.empty() ? stdout : std::fopen(file.c_str(), "wb");
+        std::ifstream in(temp, std::ios::binary);
         char chunk[1 << 16];
+        ok = out != nullptr;
         while (ok && in) {
             in.read(chunk, sizeof chunk);
             const size_t n = static_cast<size_t>(in.gcount());
-            ok = std::fwrite(chunk, 1, n, stdout) == n;
+            ok = std::fwrite(chunk, 1, n, out) == n;
         }
-        ok = std::fflush(stdout) == 0 && ok;
+        if (out) ok = (out == stdout ? std::fflush(out) : std::fclose(out)) == 0 && ok;
     } else if (ok) {
         // Keep the permissions of a file that is replaced.
-        struct stat st;
         const mode_t mask = ::umask(0);
         ::umask(mask);
-        ::chmod(temp.c_str(), ::stat(target.c_str(), &st) == 0 ? st.st_mode & 07777 : 0666 & ~mask);
-        ok = std::rename(temp.c_str(), target.c_str()) == 0;
+        ::chmod(temp.c_str(), ::stat(file.c_str(), &st) == 0 ? st.st_mode & 07777 : 0666 & ~mask);
+        ok = std::rename(temp.c_str(), file.c_str()) == 0;
     }
     const int error = errno;
     ::unlink(temp.c_str());

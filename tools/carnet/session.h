@@ -45,7 +45,8 @@ bool Readable(const std::string& path);
 int ReadInput(const std::string& path, std::string& cp1252, bool& converted);
 
 // An argument typed at the terminal, as code page 1252: converted when it is
-// UTF-8 with characters beyond ASCII. False, with a message, when it holds a
+// valid UTF-8 with characters beyond ASCII, whatever --encoding says of the
+// books. False, with a message, when it holds a
 // character that code page 1252 cannot hold.
 bool FromTerminal(const std::string& what, const std::string& arg, std::string& cp1252);
 
