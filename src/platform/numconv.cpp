@@ -2,6 +2,8 @@
 
 #include <charconv>
 #include <climits>
+#include <cmath>
+#include <limits>
 #include <cstring>
 #include <clocale>
 #include <cstdio>
@@ -112,6 +114,9 @@ double Atof(std::string_view text) {
         if (result.ec == std::errc::result_out_of_range) {
             // Rare: let the C library pick infinity or zero, as atof does.
             value = strtod_l(std::string(start, p).c_str(), nullptr, CLocale());
+            // An infinity would be written "inf", which no reader takes
+            // back: a number beyond the range reads as the largest one.
+            if (std::isinf(value)) value = std::numeric_limits<double>::max();
         }
     }
     return negative ? -value : value;
