@@ -536,6 +536,12 @@ TEST_F(Tool, LargeGeneratedBook) {
     EXPECT_EQ(Lines(run.out).size(), static_cast<size_t>(kStations));
     EXPECT_EQ(Lines(run.out).back(), "199992  Station  S20000  HI =   1.5500 , V0 =  12.34568");
     EXPECT_EQ(Carnet("next $W/big.geo --type Mesure").out, "200007\n");
+    EXPECT_EQ(Lines(Carnet("find $W/big.geo S20000").out).back(), "S20000: X 620000.125000  Y 2400000.250000  Z 100.500000");
+    EXPECT_EQ(Lines(Carnet("select $W/big.geo '11-16;200001-200006;S7'").out)[1],
+              "13 point numbers named, 14 elements of the book match");
+    EXPECT_EQ(Lines(Carnet("list $W/big.geo").out).size(), static_cast<size_t>(200000));
+    EXPECT_EQ(Carnet("format $W/big.geo -o $W/big2.geo").status, 0);
+    EXPECT_EQ(Carnet("check $W/big2.geo").out, Path("work/big2.geo") + ": 200000 elements loaded, 0 lines rejected\n");
     for (const char* format : {"csv", "geojson", "dxf", "svg"}) {
         run = Carnet("export $W/big.geo --to " + std::string(format) + " -o $W/big." + format);
         EXPECT_EQ(run.status, 0) << format << run.err;
