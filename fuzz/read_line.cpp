@@ -10,8 +10,9 @@
 // change; an element returned is where the storing rules put it (appended,
 // in place of the entry, or the path that the line continues); every element
 // can be listed, written and queried; the same lines read without a text
-// window give the same book; writing is stable and a copy of the book writes
-// the same bytes.
+// window give the same book; writing is stable, a copy of the book writes
+// the same bytes, and so does the book once every element has been turned
+// into a comment and back.
 #include <string>
 #include <utility>
 #include <vector>
@@ -125,6 +126,18 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
 
     CCarnet copy;
     copy = book;
+    FUZZ_CHECK_SAME(Written(copy, 1), text);
+
+    // Every element switched off into a comment and on again comes back as
+    // it was: the book writes the same bytes.
+    for (int i = 0; i < copy.length(); ++i) {
+        const unsigned int type = copy.typAt(i);
+        if (type == 1000 || type == 1007) continue;
+        copy.changeObjectIntoComment(&wnd, i);
+        FUZZ_CHECK(copy.typAt(i) == 1000);
+        copy.changeCommentIntoObject(&wnd, i);
+        FUZZ_CHECK(copy.typAt(i) == type);
+    }
     FUZZ_CHECK_SAME(Written(copy, 1), text);
 
     // Without a window nothing is printed and the book comes out the same.
