@@ -21,11 +21,13 @@ RATIOS = (
     ("load / getline loop", "BM_Load", "BM_LoadGetline", None),
     ("save / fprintf loop", "BM_Save", "BM_SaveFprintf", 1.5),
     ("write to a stream / fprintf loop", "BM_Write", "BM_SaveFprintf", 1.5),
+    ("forward Find / fetching every measure", "BM_FindForward", "BM_TouchMeasures", None),
 )
-GROWTH = ("BM_Load", "BM_LoadMinimalParse", "BM_Save", "BM_Write", "BM_SaveFprintf", "BM_FindForward",
+GROWTH = ("BM_Load", "BM_LoadMinimalParse", "BM_Save", "BM_Write", "BM_SaveFprintf", "BM_FindForward", "BM_TouchMeasures",
           "BM_FindBackward", "BM_HasPnt", "BM_LastMatPoints", "BM_LastMatAny")
 GROWTH_GOAL = 1.15
-PER_ELEMENT = ("BM_FindForward", "BM_FindBackward", "BM_HasPnt", "BM_LastMatPoints", "BM_LastMatAny")
+PER_ELEMENT = ("BM_FindForward", "BM_TouchMeasures", "BM_FindBackward", "BM_HasPnt", "BM_LastMatPoints",
+               "BM_LastMatAny")
 FIND_GOAL_NS = 3.0
 MEMORY_GOAL = 3.0
 PER_CALL = ("BM_IsPointInSel", "BM_FormMatNormalise", "BM_FormMatBuild", "BM_InitCode", "BM_Interprete",
