@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <clocale>
+#include <cfloat>
 #include <cmath>
 #include <cstdlib>
 
@@ -391,7 +392,7 @@ TEST(Load, NonDecimalNumbersReadAsZero) {
         double hi;
     };
     const Case cases[] = {{"Station S inf", 0.0},   {"Station S nan", 0.0},     {"Station S 0x1A", 0.0},
-                          {"Station S 1e2", 100.0}, {"Station S -2.5x", -2.5}, {"Station S 1e999", HUGE_VAL}};
+                          {"Station S 1e2", 100.0}, {"Station S -2.5x", -2.5}, {"Station S 1e999", DBL_MAX}};
     for (const Case& c : cases) {
         OneLine r(c.line);
         ASSERT_NE(r.element, nullptr) << c.line;
