@@ -46,6 +46,7 @@ for t in "${targets[@]}"; do
   mkdir -p "$work/corpus/$t" "$work/findings/$t"
   log=$work/$t.log
   status=0
+  started=$(date +%s)
   # The scratch folder of the run, in memory when the machine has it; a run
   # that stops on a finding cannot remove it itself.
   scratch=$( [ -d /dev/shm ] && echo /dev/shm || echo "${TMPDIR:-/tmp}")/carnet-fuzz-run-$$
@@ -54,11 +55,11 @@ for t in "${targets[@]}"; do
       >"$log" 2>&1 || status=$?
   rm -rf "$scratch"
   runs=$(grep -aoE 'stat::number_of_executed_units: [0-9]+' "$log" | awk '{print $2}' || true)
-  secs=$(grep -aoE 'Done [0-9]+ runs in [0-9]+ second' "$log" | awk '{print $5}' || true)
+  secs=$(( $(date +%s) - started ))
   found=$(find "$work/findings/$t" -maxdepth 1 -type f \( -name 'crash-*' -o -name 'leak-*' -o -name 'timeout-*' -o -name 'oom-*' \) | wc -l)
   rate=0
-  [ -n "$runs" ] && [ -n "$secs" ] && [ "$secs" -gt 0 ] && rate=$((runs / secs))
-  printf '%-10s %8s %12s %9s %7s %7s %7s %9s\n' "$t" "${secs:-?}" "${runs:-?}" "$rate" \
+  [ -n "$runs" ] && [ "$secs" -gt 0 ] && rate=$((runs / secs))
+  printf '%-10s %8s %12s %9s %7s %7s %7s %9s\n' "$t" "$secs" "${runs:-?}" "$rate" \
     "$(field cov "$log")" "$(field ft "$log")" "$(ls "$work/corpus/$t" | wc -l)" "$found"
   if [ "$status" -ne 0 ] || [ "$found" -ne 0 ]; then
     failed=1

@@ -13,10 +13,14 @@ namespace {
 bool IsSpace(char c) { return cp1252::IsSpace(static_cast<unsigned char>(c)); }
 
 // Takes the word at the front of s (up to the first blank) and skips the
-// white space after it.
+// white space after it. White space at the end of the word (a tab or a
+// carriage return before the blank) goes with the blank: a word never ends
+// with white space, as it never begins with some, so that a word that a
+// writer puts last on its line (a symbol) does not lose it when read back.
 std::string_view TakeWord(std::string_view& s) {
     size_t end = s.find(' ');
     std::string_view word = s.substr(0, end);
+    while (!word.empty() && IsSpace(word.back())) word.remove_suffix(1);
     size_t next = end == std::string_view::npos ? s.size() : end;
     while (next < s.size() && IsSpace(s[next])) ++next;
     s.remove_prefix(next);
