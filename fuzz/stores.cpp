@@ -5,9 +5,9 @@
 // section, a key and a value separated by '\n', then the file contents.
 //
 // Properties: reading takes any file; a value written reads back exactly
-// (or the write is refused and the file keeps every byte); writing one
-// entry leaves every other entry as it was; the typed getters clamp into
-// their range.
+// (or the write is refused and the file keeps every byte); an entry of the
+// options read before the write changes only if it is the entry written,
+// named another way; the typed getters clamp into their range.
 #include <string>
 
 #include "fuzz_support.h"
