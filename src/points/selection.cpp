@@ -64,11 +64,11 @@ bool CanonicalRange(const CString& group, int dash, CString& out) {
     const bool station = IsStationRef(range.first);
     SelPoint a = Split(range.first, station);
     SelPoint b = Split(range.second, station);
-    // The second end is one point number: a further hyphen, or a parenthesis
-    // outside station mode, leaves it a radical that no range can be written
-    // with (it would take the place of a "*" first end).
-    const bool strangeSecond = range.second.Find('-') >= 0 || (!station && range.second.Find('(') >= 0);
-    if (strangeSecond || (a.radical != "*" && b.radical != "*" && a.radical != b.radical)) {
+    // After a "*" first end the group takes the radical of the second end:
+    // one that holds a hyphen, or a parenthesis outside station mode, cannot
+    // be written in a range that reads back as the same group.
+    const bool unwritable = a.radical == "*" && (b.radical.Find('-') >= 0 || (!station && b.radical.Find('(') >= 0));
+    if (unwritable || (a.radical != "*" && b.radical != "*" && a.radical != b.radical)) {
         ShowWarning(nullptr,
                     "Le groupe %s pr\xE9sent dans la cha\xEEne de s\xE9lection\n"
                     "pr\xE9sente des radicaux diff\xE9rents !",
