@@ -44,6 +44,9 @@ for t in "${targets[@]}"; do
     exit 2
   fi
   mkdir -p "$work/corpus/$t" "$work/findings/$t"
+  # Findings of earlier runs stay where they are, but only this run's count.
+  stamp=$work/findings/$t/.started
+  touch "$stamp"
   log=$work/$t.log
   status=0
   started=$(date +%s)
@@ -56,7 +59,8 @@ for t in "${targets[@]}"; do
   rm -rf "$scratch"
   runs=$(grep -aoE 'stat::number_of_executed_units: [0-9]+' "$log" | awk '{print $2}' || true)
   secs=$(( $(date +%s) - started ))
-  found=$(find "$work/findings/$t" -maxdepth 1 -type f \( -name 'crash-*' -o -name 'leak-*' -o -name 'timeout-*' -o -name 'oom-*' \) | wc -l)
+  found=$(find "$work/findings/$t" -maxdepth 1 -type f -newer "$stamp" \
+    \( -name 'crash-*' -o -name 'leak-*' -o -name 'timeout-*' -o -name 'oom-*' \) | wc -l)
   rate=0
   [ -n "$runs" ] && [ "$secs" -gt 0 ] && rate=$((runs / secs))
   printf '%-10s %8s %12s %9s %7s %7s %7s %9s\n' "$t" "$secs" "${runs:-?}" "$rate" \
