@@ -150,6 +150,8 @@ void AppendFormatV(std::string& out, const char* format, va_list args) {
     thread_local std::string scratch(256, '\0');
     va_list copy;
     va_copy(copy, args);
+    // The analyzer does not see that a copy of the caller's list is set.
+    // NOLINTNEXTLINE(clang-analyzer-valist.Uninitialized)
     const int n = std::vsnprintf(&scratch[0], scratch.size(), format, copy);
     va_end(copy);
     if (n < 0) return;

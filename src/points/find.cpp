@@ -42,6 +42,9 @@ unsigned int BlockMask(const std::uint32_t* types, std::uint32_t type) {
 template <class T>
 class NamedScan {
 public:
+    // The ring is left uninitialised: Queue writes each cell before Dequeue
+    // reads it.
+    // cppcheck-suppress uninitMemberVar
     NamedScan(const std::uint32_t* types, void* const* elements, unsigned int type, const std::string& wanted)
         : m_types(types), m_elements(elements), m_type(type), m_wanted(wanted.data()), m_size(wanted.size()) {}
 
