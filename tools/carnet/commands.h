@@ -8,7 +8,7 @@ namespace carnet_tool {
 
 constexpr unsigned int kAnyType = 999;  // the library's "every type"
 
-// inspect.cpp
+// browse.cpp
 int Check(const std::vector<std::string>& files);
 int List(const std::string& path, bool numbers);
 int Show(const std::string& path, const std::string& type, bool json);
