@@ -26,8 +26,8 @@ void CCarnet::Projection(const CString& fileName, CString& name) {
                 name = std::string(cut.rest);
                 return;
             }
-        } else if (cut.keyword == "Cal_Cor" && cut.words.size() == 5) {
-            const int zone = numconv::Atoi(std::string(cut.words[0]).c_str());
+        } else if (cut.keyword == "Cal_Cor" && cut.Words().size() == 5) {
+            const int zone = numconv::Atoi(std::string(cut.Words()[0]).c_str());
             if (zone >= 0 && zone <= 3) {
                 name = carnet_texts::kLambertZones[zone];
                 return;

@@ -99,14 +99,14 @@ public:
     explicit Fields(const ReadContext& ctx) : m_ctx(ctx) {}
 
     CString Text(size_t i) const { return Has(i) ? m_ctx.Word(i) : CString(); }
-    int Count(size_t i) const { return Has(i) ? numconv::Atoi(std::string(m_ctx.cut.words[i]).c_str()) : 0; }
+    int Count(size_t i) const { return Has(i) ? numconv::Atoi(std::string(m_ctx.WordAt(i)).c_str()) : 0; }
     double Number(size_t i) const { return Has(i) ? m_ctx.Number(i) : UNDEF_VALUE; }
     // Everything after the first field and the white space after it, inner
     // blanks included.
     CString FreeText() const {
         if (!Has(1)) return CString();
         const std::string_view rest = m_ctx.cut.rest;
-        return CString(std::string(rest.substr(static_cast<size_t>(m_ctx.cut.words[1].data() - rest.data()))));
+        return CString(std::string(rest.substr(static_cast<size_t>(m_ctx.WordAt(1).data() - rest.data()))));
     }
 
 private:

@@ -3,7 +3,9 @@
 
 namespace carnet_texts {
 
-inline constexpr const char* kNoCommand = "Erreur ligne %d : ligne incompl\xE8te (pas de commande) !";
+inline constexpr const char* kNoCommand = "Erreur ligne %d : ligne incompl\xEAte (pas de commande) !";
+// A line that holds a NUL byte: no writer could save it as it was read.
+inline constexpr const char* kDamaged = "Erreur ligne %d : ligne endommag\xE9" "e (octet nul) !";
 inline constexpr const char* kIncomplete = "Erreur ligne %d : commande <%s> incompl\xE8te !";
 inline constexpr const char* kIncorrect = "Erreur ligne %d : commande <%s> incorrecte !";
 inline constexpr const char* kWrongCount =

@@ -118,7 +118,7 @@ void StoreCorrections(const ReadContext& ctx) {
 void StoreOlderCorrections(const ReadContext& ctx) {
     OptionStore store(ctx, kCorrections);
     store.Text("CorrAuto", "0");
-    const int zone = numconv::Atoi(std::string(ctx.cut.words[0]).c_str());
+    const int zone = numconv::Atoi(std::string(ctx.WordAt(0)).c_str());
     store.Text("Projection", zone >= 0 && zone <= 3 ? carnet_texts::kLambertZones[zone] : carnet_texts::kNoProjection);
     store.Text("AbsiMoyenne", ctx.Word(1));
     store.Text("OrdoMoyenne", ctx.Word(2));

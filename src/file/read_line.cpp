@@ -48,12 +48,21 @@ const std::unordered_map<std::string_view, unsigned int>& Keywords() {
 
 }  // namespace
 
+const std::vector<std::string_view>& LineCut::Words() const {
+    if (!m_cut) {
+        m_cut = true;
+        for (std::string_view s = rest; !s.empty();) m_words.push_back(TakeWord(s));
+    }
+    return m_words;
+}
+
 bool CutLine(std::string_view line, LineCut& cut) {
     size_t b = 0, e = line.size();
     while (b < e && IsSpace(line[b])) ++b;
     while (e > b && IsSpace(line[e - 1])) --e;
     std::string_view s = line.substr(b, e - b);
-    cut.words.clear();
+    cut.m_words.clear();
+    cut.m_cut = false;
     cut.keyword = {};
     cut.rest = {};
     std::string_view probe = s;
@@ -61,12 +70,11 @@ bool CutLine(std::string_view line, LineCut& cut) {
     if (s.empty()) return false;
     cut.keyword = TakeWord(s);
     cut.rest = s;
-    while (!s.empty()) cut.words.push_back(TakeWord(s));
     return true;
 }
 
 double ReadContext::Number(size_t i) const {
-    return numconv::Atof(cut.words[i]);
+    return numconv::Atof(WordAt(i));
 }
 
 void* ReadContext::Store(void* p, unsigned int code) {
@@ -96,12 +104,20 @@ void* ReadContext::Incorrect() {
 }
 
 void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend) {
-    // A line ends at a NUL byte, as every text of the library and the host
-    // does: the bytes after one in a damaged file would be lost or cut
-    // differently by each writer, so the saved book would not load the same.
-    line = line.substr(0, line.find('\0'));
     if (line.empty()) return nullptr;
     assert(index >= 0 && index <= book.length());
+    // A NUL byte ends every text of the library and the host, so the bytes
+    // after one would be lost on saving: the line is damaged, shown with its
+    // NUL bytes written \0.
+    if (line.find('\0') != std::string_view::npos) {
+        if (wnd) {
+            std::string shown;
+            for (char c : line) shown += c ? std::string(1, c) : std::string("\\0");
+            wnd->Printf(1, carnet_texts::kDamaged, index + 1);
+            wnd->Printf(1, carnet_texts::kShowLine, shown.c_str());
+        }
+        return nullptr;
+    }
     ReadContext ctx(book, wnd, line, index, bAppend);
     if (!CutLine(line, ctx.cut)) {
         if (wnd) {

@@ -13,7 +13,7 @@ void* ReadPath(ReadContext& ctx) {
     const size_t n = ctx.WordCount();
     if (!book.isEmpty() && book.typLast() == 1007 && book.ptrLast()) {
         auto* last = static_cast<CChemin*>(const_cast<void*>(static_cast<const CCarnet&>(book).ptrLast()));
-        if (n >= 1 && last->Np().str() == ctx.cut.words[0]) {
+        if (n >= 1 && last->Np().str() == ctx.WordAt(0)) {
             if (n < 2) return ctx.Incomplete();
             for (size_t i = 1; i < n; ++i) last->add(ctx.Word(i));
             // No new element: the loader's increment is made up for here.

@@ -67,7 +67,7 @@ void* ReadAppareil(ReadContext& ctx) {
     std::string name;
     for (size_t i = 6; i < ctx.WordCount(); ++i) {
         if (i > 6) name += ' ';
-        name += ctx.cut.words[i];
+        name += ctx.WordAt(i);
     }
     return ctx.Store(new CAppareil(CString(std::move(name)), ctx.Number(0), ctx.Number(1), ctx.Number(2),
                                    ctx.Number(3), ctx.Number(4), ctx.Number(5)),
@@ -114,15 +114,15 @@ void* ReadPoint(ReadContext& ctx) {
     if (n < 2) return ctx.Incomplete();
     size_t next = 1;
     int lock = 0;
-    if (ctx.cut.words[1].size() == 1) {
-        lock = numconv::Atoi(std::string(ctx.cut.words[1]).c_str()) & 3;
+    if (ctx.WordAt(1).size() == 1) {
+        lock = numconv::Atoi(std::string(ctx.WordAt(1)).c_str()) & 3;
         next = 2;
     }
     double coords[3];
     int count = 0;
     std::string symbol;
     for (size_t i = next; i < n; ++i) {
-        std::string_view w = ctx.cut.words[i];
+        std::string_view w = ctx.WordAt(i);
         if (count < 3 && IsCoordinate(w)) {
             coords[count++] = numconv::Atof(w);
         } else {
@@ -158,7 +158,7 @@ void* ReadLevelling(ReadContext& ctx, unsigned int code) {
     int count = 0;
     CString sy;
     for (size_t i = 1; i < n; ++i) {
-        std::string_view w = ctx.cut.words[i];
+        std::string_view w = ctx.WordAt(i);
         // Words 2 and 3 are values when they hold a point; word 4 only while
         // fewer than two values were found. Any other word replaces the symbol.
         if (HasDot(w) && (i < 3 || count < 2)) {

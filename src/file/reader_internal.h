@@ -16,12 +16,20 @@ namespace carnet_reader {
 struct LineCut {
     std::string_view keyword;
     std::string_view rest;  // everything after the keyword and its white space
-    std::vector<std::string_view> words;
+
+    // The rest cut into words (a word ends at a blank; white space after a
+    // word is skipped), cut at the first call: the free-text keywords take
+    // the rest whole, so a long comment is never cut into words.
+    const std::vector<std::string_view>& Words() const;
+
+private:
+    friend bool CutLine(std::string_view line, LineCut& cut);
+    mutable std::vector<std::string_view> m_words;
+    mutable bool m_cut = false;
 };
 
-// Trims the line, drops a line-number prefix, takes the keyword and cuts the
-// rest into words (a word ends at a blank; white space after a word is
-// skipped). False when no keyword is left.
+// Trims the line, drops a line-number prefix and takes the keyword. False
+// when no keyword is left.
 bool CutLine(std::string_view line, LineCut& cut);
 
 // Everything a branch of the reader needs to build, store and report.
@@ -37,8 +45,9 @@ public:
     int bAppend;
     LineCut cut;
 
-    size_t WordCount() const { return cut.words.size(); }
-    CString Word(size_t i) const { return CString(std::string(cut.words[i])); }
+    size_t WordCount() const { return cut.Words().size(); }
+    std::string_view WordAt(size_t i) const { return cut.Words()[i]; }
+    CString Word(size_t i) const { return CString(std::string(WordAt(i))); }
     double Number(size_t i) const;
 
     // Stores a new element at the reader's position: appended when the

@@ -1,5 +1,7 @@
 #include <carnet/point.h>
 
+#include <cmath>
+
 #include <carnet/numconv.h>
 
 #include "core/line_internal.h"
@@ -50,6 +52,10 @@ int CPointGen::is1D() const { return isNamed() && IsUndef(m_X) && IsUndef(m_Y) &
 int CPointGen::isOk() const {
     if (!isNamed()) return 0;
     const bool x = !IsUndef(m_X), y = !IsUndef(m_Y), z = !IsUndef(m_Z);
+    // A given coordinate must be a number: NaN or an infinity would be
+    // written as a word that does not read back as a coordinate.
+    for (double v : {m_X, m_Y, m_Z})
+        if (!IsUndef(v) && !std::isfinite(v)) return 0;
     if (x && y) return 1;             // 3D or 2D
     if (!x && !y && z) return 1;      // 1D
     if (!x && !y && !z && m_bZConst) return 1;  // placeholder kept for its height lock

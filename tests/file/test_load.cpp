@@ -84,11 +84,11 @@ TEST(ReadLine, FrameAndMessages) {
 
     OneLine blanks("   \t ");
     ASSERT_EQ(blanks.wnd.Texts().size(), 2u);
-    EXPECT_EQ(blanks.wnd.Texts()[0], "Erreur ligne 1 : ligne incompl\xE8te (pas de commande) !");
+    EXPECT_EQ(blanks.wnd.Texts()[0], "Erreur ligne 1 : ligne incompl\xEAte (pas de commande) !");
     EXPECT_EQ(blanks.wnd.Texts()[1], " (   \t )");
 
     OneLine number("000012");
-    EXPECT_EQ(number.wnd.Texts()[0], "Erreur ligne 1 : ligne incompl\xE8te (pas de commande) !");
+    EXPECT_EQ(number.wnd.Texts()[0], "Erreur ligne 1 : ligne incompl\xEAte (pas de commande) !");
 
     OneLine empty("");
     EXPECT_TRUE(empty.wnd.Texts().empty());

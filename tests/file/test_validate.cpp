@@ -109,13 +109,21 @@ TEST(Validate, PointMergeOutcomes) {
         // A negative line number appends without merging.
         book.validPoint(&wnd, Pt("P1", 1.0, 2.0, 3.0), -1);
         EXPECT_EQ(book.length(), 3);
-        // Incomplete points are destroyed; only a non-temporary one is reported.
+        // Incomplete points are destroyed; only a non-temporary one is
+        // reported. A coordinate that is not a number makes a point incomplete.
         wnd.Clear();
+        const double inf = HUGE_VAL;
         book.validPoint(&wnd, new CPointGen("P2", 1.0, UNDEF_VALUE, ""), 7);
         book.validPoint(&wnd, new CPointGen("P3", UNDEF_VALUE, ""), 8);
+        book.validPoint(&wnd, new CPointGen("P4", std::nan(""), 2.0, 3.0, ""), 9);
+        book.validPoint(&wnd, new CPointGen("P5", 1.0, inf, ""), 10);
+        book.validPoint(&wnd, new CPointGen("P6", -inf, ""), 11);
         EXPECT_EQ(book.length(), 3);
-        ASSERT_EQ(wnd.Texts().size(), 1u);
-        EXPECT_EQ(wnd.Texts()[0], "Erreur ligne 7 : donn\xE9" "es incompl\xE8tes sur le point <P2> !");
+        EXPECT_EQ(wnd.Texts(), (std::vector<std::string>{
+                                   "Erreur ligne 7 : donn\xE9" "es incompl\xE8tes sur le point <P2> !",
+                                   "Erreur ligne 9 : donn\xE9" "es incompl\xE8tes sur le point <P4> !",
+                                   "Erreur ligne 10 : donn\xE9" "es incompl\xE8tes sur le point <P5> !",
+                                   "Erreur ligne 11 : donn\xE9" "es incompl\xE8tes sur le point <P6> !"}));
     }
 }
 
