@@ -1,4 +1,5 @@
 #include <carnet/ccarnet.h>
+#include <carnet/fileio.h>
 #include <carnet/messages.h>
 #include <carnet/numconv.h>
 
@@ -11,27 +12,28 @@ void CCarnet::Projection(const CString& fileName, CString& name) {
     const CString given = fileName;  // may be m_FileName itself
     if (given.IsEmpty() && !FileOpen(m_FileName, nullptr)) return;
     const CString path = given.IsEmpty() ? m_FileName : given;
-    carnet_file::LineReader in(path.GetString());
-    if (!in.IsOpen()) {
+    CarnetFileBytes bytes;
+    if (bytes.Read(path.GetString()) != 0) {
         ShowWarning(nullptr, carnet_texts::kCannotOpen, path.GetString());
         return;
     }
+    ProjectionOfBytes(bytes.View(), name);
+}
+
+void CCarnet::ProjectionOfBytes(std::string_view bytes, CString& name) {
+    name.Empty();
     // Lines are cut exactly as the loader cuts them; only the two projection
-    // keywords are looked at, and nothing is stored.
+    // keywords are looked at, and nothing is stored. The first that names
+    // one ends the search.
     carnet_reader::LineCut cut;
-    for (std::string_view line; in.Next(line);) {
-        if (line.empty() || !carnet_reader::CutLine(line, cut)) continue;
+    carnet_file::ForEachLine(bytes, [&](std::string_view line, size_t) {
+        if (line.empty() || !carnet_reader::CutLine(line, cut)) return true;
         if (cut.keyword == "Option_Projec") {
-            if (!cut.rest.empty()) {
-                name = std::string(cut.rest);
-                return;
-            }
+            if (!cut.rest.empty()) name = std::string(cut.rest);
         } else if (cut.keyword == "Cal_Cor" && cut.Words().size() == 5) {
             const int zone = numconv::Atoi(std::string(cut.Words()[0]).c_str());
-            if (zone >= 0 && zone <= 3) {
-                name = carnet_texts::kLambertZones[zone];
-                return;
-            }
+            if (zone >= 0 && zone <= 3) name = carnet_texts::kLambertZones[zone];
         }
-    }
+        return name.IsEmpty();
+    });
 }

@@ -4,10 +4,13 @@
 #include <cassert>
 #include <cstdint>
 #include <cstdio>
+#include <functional>
+#include <string_view>
 
 #include <carnet/carray.h>
 #include <carnet/cstring.h>
 #include <carnet/element_types.h>
+#include <carnet/fileio.h>
 #include <carnet/txtwnd.h>
 
 class CWnd;
@@ -17,6 +20,9 @@ public:
     // Data that host code reads or sets directly.
     CString m_FileName;
     CString m_ParamFile;
+    // The file as Load read it, unknown otherwise: Save refuses to replace
+    // the book's own file when someone else has written it since.
+    CarnetFileState m_FileState;
 
 protected:
     CPtrArray m_Elements;
@@ -143,6 +149,13 @@ public:
     // ---- Loading and validation ----
     int Load(CNorvexTxtWnd* pWnd, const CString& fileName, int bAppend, CWnd* pParent);
     int Load(CNorvexTxtWnd* pWnd, const CString& fileName, const CString& paramFile, int bAppend, CWnd* pParent);
+    // Loads bytes held in memory as Load loads a file's (same reader, rules
+    // and messages), with the options going to paramFile; m_FileName is
+    // unchanged. `released`, when given, is told every few megabytes the
+    // offset before which the bytes are no longer needed. 1 when the book
+    // then holds an element, else 0.
+    int LoadBytes(CNorvexTxtWnd* pWnd, std::string_view bytes, const CString& paramFile, int bAppend,
+                  const std::function<void(size_t)>& released = nullptr);
     int FileOpen(const CString& initialName, CWnd* pParent);
     void* ReadLine(CNorvexTxtWnd* pWnd, CString line, int& index, int bAppend);
     CStation* validStation(CNorvexTxtWnd* pWnd, CStation* p, int line);
@@ -161,10 +174,21 @@ public:
     void Write(std::FILE* f, int n);
     void Write(std::FILE* f, const CString& paramFile, int n);
     void BackUp();
+    // BackUp that says how it went: 1 when the copy was made, 0 when there
+    // was no file to copy, -1 when it failed (error, when given, receives
+    // the errno: ELOOP, EISDIR or EINVAL for a backup name that is a link, a
+    // folder or not a regular file, EEXIST when it is the book's own name).
+    int TryBackUp(int* error = nullptr);
+    // The backup's name: m_FileName with the last three characters of its
+    // file name made "sbk", or ".sbk" added to a file name of fewer.
+    CString BackUpName() const;
     void WriteOptions(std::FILE* f);
 
     // ---- Projection lookup and face reduction ----
     void Projection(const CString& fileName, CString& name);
+    // The projection that the lines of a book held in memory declare, as
+    // Projection finds it in a file; empty when none.
+    static void ProjectionOfBytes(std::string_view bytes, CString& name);
     static double avCD(double av);
     static double ahCD(double ah, double av);
     static int setCD(double& ah, double& av);

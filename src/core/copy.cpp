@@ -30,6 +30,7 @@ const CCarnet& CCarnet::operator=(const CCarnet& other) {
     }
     m_FileName = other.m_FileName;
     m_ParamFile = other.m_ParamFile;
+    m_FileState = other.m_FileState;
     m_CmdText = other.m_CmdText;
     m_MatText = other.m_MatText;
     m_ParText = other.m_ParText;

@@ -1,5 +1,6 @@
+// Loading a field book: from a file read once into memory, or from bytes a
+// host already holds, line by line through the same reader.
 #include <sys/stat.h>
-
 
 #include <carnet/ccarnet.h>
 #include <carnet/filedlg.h>
@@ -37,21 +38,41 @@ int CCarnet::Load(CNorvexTxtWnd* pWnd, const CString& fileName, int bAppend, CWn
     if (name.IsEmpty() && !FileOpen(m_FileName, pParent)) return 0;
     const CString path = name.IsEmpty() ? m_FileName : name;
 
-    carnet_file::LineReader in(path.GetString());
-    if (!in.IsOpen()) {
+    CarnetFileBytes bytes;
+    if (bytes.Read(path.GetString()) != 0) {
         ShowWarning(pParent, carnet_texts::kCannotOpen, path.GetString());
         return 0;
     }
-    int counter = 0;
-    if (!bAppend)
-        removeAll(1);
-    else
-        counter = length();
-
-    for (std::string_view line; in.Next(line);) {
-        if (line.empty()) continue;
-        if (carnet_reader::ReadOneLine(*this, pWnd, line, counter, bAppend)) ++counter;
+    const CString paramFile = m_ParamFile;
+    const int loaded = LoadBytes(pWnd, bytes.View(), paramFile, bAppend, [&bytes](size_t done) { bytes.Release(done); });
+    if (!bAppend) {
+        if (!name.IsEmpty()) m_FileName = name;
+        m_FileState = bytes.State();
     }
-    if (!bAppend && !name.IsEmpty()) m_FileName = name;
+    return loaded;
+}
+
+int CCarnet::LoadBytes(CNorvexTxtWnd* pWnd, std::string_view bytes, const CString& paramFile, int bAppend,
+                       const std::function<void(size_t)>& released) {
+    m_ParamFile = paramFile;
+    int counter = 0;
+    if (!bAppend) {
+        removeAll(1);
+        m_FileState = CarnetFileState();
+    } else {
+        counter = length();
+    }
+    // The caller may give back the bytes read every few megabytes, so that
+    // the text and the book it becomes are not both held whole.
+    constexpr size_t kReleaseStep = size_t{4} << 20;
+    size_t nextRelease = kReleaseStep;
+    carnet_file::ForEachLine(bytes, [&](std::string_view line, size_t end) {
+        if (!line.empty() && carnet_reader::ReadOneLine(*this, pWnd, line, counter, bAppend)) ++counter;
+        if (released && end >= nextRelease) {
+            released(end);
+            nextRelease = end + kReleaseStep;
+        }
+        return true;
+    });
     return length() >= 1 ? 1 : 0;
 }

@@ -1,8 +1,7 @@
 // Saving a field book and keeping a backup of its previous file. Whatever
-// goes wrong, a file on disk is either the old one or the complete new one:
-// the new bytes go to a temporary file that then replaces the file as a
-// whole (a device or a pipe, which cannot be replaced, is written to
-// instead).
+// goes wrong, a file on disk is either the old one or the complete new one
+// (CarnetWriteFile); a device or a pipe, which cannot be replaced, is
+// written to instead.
 #include <sys/stat.h>
 
 #include <cerrno>
@@ -14,59 +13,10 @@
 #include <carnet/messages.h>
 
 #include "file/file_texts_internal.h"
-#include "platform/storefile_internal.h"
 
 namespace {
 
-// New files get the usual rw-rw-rw- less the umask, as fopen gives.
-constexpr unsigned int kNewFileMode = 0666;
-
 int Failed(int err) { return err ? err : EIO; }
-
-using carnet_storefile::Filler;
-
-// Writes to something that is not a regular file (a terminal, a pipe,
-// /dev/null): it cannot be replaced, only written to.
-int WriteInPlace(const std::string& path, bool append, const Filler& fill) {
-    std::FILE* f = std::fopen(path.c_str(), append ? "ab" : "wb");
-    if (!f) return Failed(errno);
-    int err = fill(f);
-    if (std::fflush(f) != 0 && !err) err = Failed(errno);
-    if (std::ferror(f) && !err) err = EIO;
-    if (std::fclose(f) != 0 && !err) err = Failed(errno);
-    return err;
-}
-
-// Puts the bytes that `fill` writes in the file (after its present bytes
-// when appending). A regular or new file is replaced as a whole, keeping its
-// permissions. Returns 0 or an errno.
-int StoreBytes(const std::string& path, bool append, unsigned int newMode, const Filler& fill) {
-    struct stat st;
-    const bool exists = ::stat(path.c_str(), &st) == 0;
-    if (exists && !S_ISREG(st.st_mode)) return WriteInPlace(path, append, fill);
-    if (!exists || !append) return carnet_storefile::ReplaceAtomicallyWith(path, newMode, fill);
-    std::string previous;
-    if (int err = carnet_storefile::ReadAll(path, previous)) return err;
-    return carnet_storefile::ReplaceAtomicallyWith(path, newMode, [&](std::FILE* f) {
-        if (int err = carnet_storefile::WriteAllTo(f, previous)) return err;
-        return fill(f);
-    });
-}
-
-// The book as Write gives it, with lines numbered from 1, streamed to the
-// file as it is formatted.
-Filler BookLines(CCarnet& book) {
-    return [&book](std::FILE* f) {
-        book.Write(f, 1);
-        return std::ferror(f) ? Failed(errno) : 0;
-    };
-}
-
-// The backup sits beside the file: its last three characters become "sbk".
-std::string BackUpName(const std::string& name) {
-    if (name.size() < 3) return "sbk";
-    return name.substr(0, name.size() - 3) + "sbk";
-}
 
 }  // namespace
 
@@ -86,13 +36,26 @@ int CCarnet::Save(const CString& fileName, CWnd* pParent, bool bAppend) {
     if (given.IsEmpty() && !FileSave(m_FileName)) return 0;
     const CString path = given.IsEmpty() ? m_FileName : given;
 
-    if (StoreBytes(path.str(), bAppend, kNewFileMode, BookLines(*this)) != 0) {
+    // The book's own file must still be the one that was read: another
+    // writer's lines would otherwise be lost without a word.
+    CarnetWriteOptions options;
+    if (path == previous) options.expected = m_FileState;
+    options.append = bAppend;
+    CarnetFileState written;
+    options.written = &written;
+    const int err = CarnetWriteFile(path.GetString(), [this](std::FILE* f) {
+        Write(f, 1);
+        return std::ferror(f) ? Failed(errno) : 0;
+    }, options);
+    if (err != 0) {
         // A failed save leaves the book naming the file it was loaded from.
         m_FileName = previous;
         ShowWarning(pParent, carnet_texts::kCannotSave, path.GetString());
         return 0;
     }
     if (!given.IsEmpty()) m_FileName = given;
+    // The file written is the one the book now stands for.
+    m_FileState = written;
     return 1;
 }
 
@@ -106,13 +69,41 @@ void CCarnet::Write(std::FILE* f, const CString& paramFile, int n) {
     Write(f, n);
 }
 
-void CCarnet::BackUp() {
+CString CCarnet::BackUpName() const {
+    // The rule applies to the file name only, never across a folder.
+    const std::string path = m_FileName.str();
+    const size_t slash = path.rfind('/');
+    const size_t name = slash == std::string::npos ? 0 : slash + 1;
+    if (path.size() - name < 3) return CString(path + ".sbk");
+    return CString(path.substr(0, path.size() - 3) + "sbk");
+}
+
+void CCarnet::BackUp() { TryBackUp(nullptr); }
+
+int CCarnet::TryBackUp(int* error) {
+    int err = 0;
+    int made = -1;
     // Only a file can be copied: a folder or a device has no previous version.
     struct stat st;
-    if (::stat(m_FileName.GetString(), &st) != 0 || !S_ISREG(st.st_mode)) return;
-    std::string data;
-    if (carnet_storefile::ReadAll(m_FileName.str(), data) != 0) return;
-    // A new backup is no more readable by others than the file it copies.
-    StoreBytes(BackUpName(m_FileName.str()), false, st.st_mode & 0777,
-               [&data](std::FILE* f) { return carnet_storefile::WriteAllTo(f, data); });
+    const CString backup = BackUpName();
+    CarnetFileBytes data;
+    if (::stat(m_FileName.GetString(), &st) != 0 || !S_ISREG(st.st_mode)) {
+        made = 0;
+    } else if (backup == m_FileName) {
+        err = EEXIST;
+    } else if ((err = data.Read(m_FileName.GetString())) == 0) {
+        // The backup is a new regular file with the book's permissions; a
+        // link, a folder, a pipe or a device at its name is refused, never
+        // followed or written to.
+        CarnetWriteOptions options;
+        options.like = &st;
+        options.regularOnly = true;
+        err = CarnetWriteFile(backup.GetString(), [&data](std::FILE* f) {
+            const std::string_view bytes = data.View();
+            return std::fwrite(bytes.data(), 1, bytes.size(), f) == bytes.size() ? 0 : Failed(errno);
+        }, options);
+        if (err == 0) made = 1;
+    }
+    if (error) *error = err;
+    return made;
 }

@@ -9,16 +9,15 @@
 namespace carnet_storefile {
 
 // Reads the whole file into out. Returns 0, or the errno of the failure
-// (ENOENT for a missing file).
+// (ENOENT for a missing file, EISDIR or EINVAL for what is not a regular
+// file: a pipe could block and a device never end).
 int ReadAll(const std::string& path, std::string& out);
 
-// Replaces the file with data: the bytes go to a temporary file in the same
-// folder, are flushed to disk, and the temporary file is then renamed over the
-// target, so readers and a crash see either the old store or the new one,
-// never a mix. A symbolic link is followed and its target replaced. An
-// existing file keeps its permissions and owner; a new one gets newMode less
-// the process umask. Returns 0, or the errno of the failure (the target is
-// then untouched and no temporary file is left).
+// Replaces the file with data, whole or not at all, as CarnetWriteFile does
+// (a link followed unless another user planted it in a sticky folder; an
+// existing file keeps its permissions and owner; a new one gets newMode
+// less the process umask). Returns 0, or the errno of the failure (the
+// target is then untouched and no temporary file is left).
 int ReplaceAtomically(const std::string& path, const std::string& data, unsigned int newMode);
 
 // Writes the new bytes of a file to a stream; returns 0, or an errno.

@@ -110,7 +110,8 @@ protected:
     // Runs the tool; $EX stands for the example, $W for the work folder.
     Outcome Carnet(const std::string& args) {
         const std::string out = Path("out.txt"), err = Path("err.txt");
-        const std::string cmd = std::string(CARNET_TOOL) + " " + Expand(args) + " >" + out + " 2>" + err;
+        // The arguments may end with redirections of their own, which win.
+        const std::string cmd = std::string(CARNET_TOOL) + " >" + out + " 2>" + err + " " + Expand(args);
         const int raw = std::system(cmd.c_str());
         Outcome run;
         run.status = WIFEXITED(raw) ? WEXITSTATUS(raw) : -1;
@@ -391,7 +392,7 @@ const Case kCases[] = {
      "$W/absent/c.geo: Impossible d'enregistrer la Sitebook sous $W/absent/c.geo !\n",
      {}},
     {"an export that cannot be written leaves nothing", "export $EX --to svg -o $W/absent/c.svg", {}, 2, "",
-     "$W/absent/c.svg: cannot write: No such file or directory\n", {}},
+     "$W/absent/c.svg: cannot write: No such file or directory; nothing written\n", {}},
     {"an export to a full disk says so", "export $EX --to dxf -o /dev/full", {}, 2, "",
      "/dev/full: cannot write: No space left on device; nothing written\n", {}},
     {"no subcommand prints the help", "", {}, 0, "carnet: inspect, query, convert and export land-surveying field books (.geo files)\n...\n", "", {}},

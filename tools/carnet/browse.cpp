@@ -165,13 +165,11 @@ int Options(const std::string& location) {
 }
 
 int ShowProjection(const std::string& path) {
-    std::string source;
-    const int status = SourceOf(path, source);
+    Input input;
+    const int status = ReadInput(path, input);
     if (status != kOk) return status;
-    CurrentSession().context = path;
-    CCarnet book;
     CString name;
-    book.Projection(source, name);
+    CCarnet::ProjectionOfBytes(input.Bytes(), name);
     if (name.IsEmpty())
         Say(path, "declares no projection");
     else

@@ -2,9 +2,9 @@
 // the current format, and a typed code as a drawing command.
 #include <sys/stat.h>
 
+#include <cerrno>
 #include <cstdio>
-#include <fstream>
-#include <iterator>
+#include <cstring>
 #include <type_traits>
 #include <utility>
 
@@ -21,21 +21,17 @@ void Put(const std::string& cp1252) {
     std::fwrite(text.data(), 1, text.size(), stdout);
 }
 
-std::string Contents(const std::string& path) {
-    std::ifstream in(path, std::ios::binary);
-    return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
-
-// The library's backup says nothing when it fails; here a failed backup
-// must stop the save that would overwrite the only copy.
-bool BackUpDone(CCarnet& book) {
-    const std::string target = book.m_FileName.str();
-    struct stat st;
-    if (::stat(target.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return true;  // nothing to keep
-    book.BackUp();
-    const std::string backup = target.size() < 3 ? "sbk" : target.substr(0, target.size() - 3) + "sbk";
-    if (Contents(backup) == Contents(target)) return true;
-    Say(target, "cannot back up to " + backup + "; nothing written");
+// Makes the backup that must exist before the book's only copy is
+// overwritten; false, with the reason, when it cannot be made.
+bool BackedUp(CCarnet& book) {
+    int err = 0;
+    if (book.TryBackUp(&err) >= 0) return true;
+    const std::string backup = book.BackUpName().str();
+    const std::string why = err == EEXIST ? "the book's own name is its backup's"
+                            : err == ELOOP || err == EISDIR || err == EINVAL
+                                ? backup + " is not a regular file"
+                                : std::string(std::strerror(err));
+    Say(book.m_FileName.str(), "cannot back up to " + backup + " (" + why + "); nothing written");
     return false;
 }
 
@@ -114,27 +110,34 @@ unsigned int DrawingType(const std::string& keyword) {
 int Format(const std::string& path, const std::string& output, bool backup, const std::string& params) {
     CCarnet book;
     int rejected = 0;
-    const int status = LoadBook(path, book, rejected);
+    const int status = LoadBook(path, book, rejected, true);
     if (status != kOk) return status;
     const std::string target = output.empty() ? path : output;
     CurrentSession().context = target;
+    // Another file than the one read has no version to be kept from.
+    const CarnetFileState read = book.m_FileState, there = CarnetStateOf(target.c_str());
+    if (target != path && (read.device != there.device || read.inode != there.inode)) book.m_FileState = CarnetFileState();
     book.m_FileName = target;
-    if (backup && !BackUpDone(book)) return kUnreadable;
+    if (backup && !BackedUp(book)) return kUnreadable;
     if (!params.empty()) book.m_ParamFile = params;
-    return book.Save(target, nullptr, false) ? kOk : kUnreadable;
+    if (book.Save(target, nullptr, false)) return kOk;
+    const CarnetFileState now = CarnetStateOf(target.c_str());
+    if (book.m_FileState.IsKnown() && now.IsKnown() && now != book.m_FileState)
+        Say(target, "changed since it was read (another program wrote to it); nothing written");
+    return kUnreadable;
 }
 
 int Codes(const std::string& table, int version, const std::string& output) {
-    std::string bytes;
-    bool converted = false;
-    const int status = ReadInput(table, bytes, converted);
+    Input input;
+    const int status = ReadInput(table, input);
     if (status != kOk) return status;
+    const std::string_view bytes = input.Bytes();
     std::string written;
     long refused = 0, number = 0;
     for (size_t start = 0; start < bytes.size(); ++number) {
         size_t end = bytes.find('\n', start);
         if (end == std::string::npos) end = bytes.size();
-        std::string line = bytes.substr(start, end - start);
+        std::string line(bytes.substr(start, end - start));
         start = end + 1;
         if (!line.empty() && line.back() == '\r') line.pop_back();
         if (line.find_first_not_of(" \t") == std::string::npos) continue;
@@ -159,10 +162,8 @@ int Codes(const std::string& table, int version, const std::string& output) {
         Put(written);
         return kOk;
     }
-    return WriteOutput(output, [&written](const std::string& path) {
-        std::ofstream out(path, std::ios::binary | std::ios::trunc);
-        out << written;
-        return static_cast<bool>(out.flush());
+    return WriteOutput(output, [&written](std::FILE* f) {
+        return std::fwrite(written.data(), 1, written.size(), f) == written.size();
     });
 }
 

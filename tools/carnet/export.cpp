@@ -164,18 +164,16 @@ bool WriteGeoJson(const Survey& survey, std::FILE* f) {
 int Export(const std::string& path, const std::string& format, const std::string& output) {
     CCarnet book;
     int rejected = 0;
-    const int status = LoadBook(path, book, rejected);
+    const int status = LoadBook(path, book, rejected, true);
     if (status != kOk && (status != kRejected || rejected == 0)) return status;
     const Survey survey = Gather(book, path);
     if (survey.points.empty() && survey.paths.empty()) Say(path, "no point has known coordinates");
-    const int written = WriteOutput(output, [&](const std::string& file) {
-        if (format == "dxf") return WriteDxf(survey, file);
-        std::FILE* f = std::fopen(file.c_str(), "wb");
-        if (!f) return false;
-        const bool ok = format == "csv"       ? WriteCsv(survey, f)
-                        : format == "geojson" ? WriteGeoJson(survey, f)
-                                              : WriteSvg(survey, f);
-        return std::fclose(f) == 0 && ok;
+    const int written = WriteOutput(output, [&](std::FILE* f) {
+        // dxflib opens a file of its own: the one under the stream.
+        if (format == "dxf") return WriteDxf(survey, "/proc/self/fd/" + std::to_string(fileno(f)));
+        return format == "csv"       ? WriteCsv(survey, f)
+               : format == "geojson" ? WriteGeoJson(survey, f)
+                                     : WriteSvg(survey, f);
     });
     return std::max(status, written);
 }

@@ -3,8 +3,14 @@
 // Exit status of every command: 0 when all went well, 1 when lines of a book
 // were rejected or an input was refused, 2 when a file could not be read or
 // written or the command line was wrong.
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <csignal>
 #include <cstdio>
 #include <cstring>
+#include <new>
 #include <string>
 #include <vector>
 
@@ -56,6 +62,47 @@ Encoding EncodingNamed(const std::string& name) {
     return Encoding::Auto;
 }
 
+// A standard stream that the tool was started without is opened on
+// /dev/null, read-only: no file the tool opens can then take its number (a
+// book written by accident), and what is written to it fails and is
+// reported instead of vanishing.
+void ReserveStandardStreams() {
+    for (int fd = 0; fd <= 2; ++fd) {
+        if (::fcntl(fd, F_GETFD) != -1 || errno != EBADF) continue;
+        const int opened = ::open("/dev/null", O_RDONLY);
+        if (opened >= 0 && opened != fd) {
+            ::dup2(opened, fd);
+            ::close(opened);
+        }
+    }
+}
+
+// Interrupted, hung up, terminated or writing to a closed pipe: the
+// temporary files go, then the signal ends the tool as it would have, without
+// a word.
+extern "C" void EndOnSignal(int sig) {
+    CarnetRemovePendingFiles();
+    RemoveScratch();
+    ::raise(sig);  // the handler was reset to the default action
+}
+
+void EndOnSignals() {
+    struct sigaction action {};
+    action.sa_handler = EndOnSignal;
+    action.sa_flags = SA_RESETHAND;
+    sigfillset(&action.sa_mask);
+    for (int sig : {SIGINT, SIGTERM, SIGHUP, SIGPIPE}) ::sigaction(sig, &action, nullptr);
+}
+
+// Every command ends by checking that what it wrote to standard output got
+// there: a full disk or a closed output is a failure, not a silent success.
+int Finish(int status) {
+    errno = 0;
+    if (std::fflush(stdout) == 0 && !std::ferror(stdout)) return status;
+    Say("carnet", std::string("cannot write to standard output: ") + std::strerror(errno ? errno : EIO));
+    return kUnreadable;
+}
+
 CLI::App* Subcommand(CLI::App& app, const char* name, const char* what, const char* example) {
     CLI::App* sub = app.add_subcommand(name, what);
     sub->footer(std::string("Example:\n  ") + example);
@@ -64,7 +111,7 @@ CLI::App* Subcommand(CLI::App& app, const char* name, const char* what, const ch
 
 }  // namespace
 
-int main(int argc, char** argv) {
+int Run(int argc, char** argv) {
     CLI::App app{"carnet: inspect, query, convert and export land-surveying field books (.geo files)"};
     app.set_version_flag("--version", kVersion);
     app.require_subcommand(0, 1);
@@ -185,10 +232,6 @@ int main(int argc, char** argv) {
         std::printf("%s", app.help().c_str());
         return kOk;
     }
-    if (!session.store.IsReady()) {
-        Say("carnet", std::string("cannot create a temporary folder: ") + std::strerror(errno));
-        return kUnreadable;
-    }
     if (check->parsed()) return Check(files);
     if (listing->parsed()) return List(file, numbers);
     if (show->parsed()) return Show(file, type, json);
@@ -208,4 +251,18 @@ int main(int argc, char** argv) {
     if (projection->parsed()) return ShowProjection(file);
     if (exporting->parsed()) return Export(file, format, target);
     return Format(file, target, backup, params);
+}
+
+int main(int argc, char** argv) {
+    ReserveStandardStreams();
+    EndOnSignals();
+    int status = kUnreadable;
+    try {
+        status = Run(argc, argv);
+    } catch (const std::bad_alloc&) {
+        Say("carnet", "out of memory");
+    } catch (const std::exception& e) {
+        Say("carnet", e.what());
+    }
+    return Finish(status);
 }

@@ -1,6 +1,6 @@
 // What every command of one run shares: the encodings, the scratch folder,
-// the diagnostics on standard error, reading books and tables in the input
-// encoding, and writing outputs whole or not at all.
+// the diagnostics on standard error, reading books and tables once in the
+// input encoding, and writing outputs whole or not at all.
 #pragma once
 
 #include <cstdio>
@@ -9,6 +9,7 @@
 #include <string_view>
 
 #include <carnet/ccarnet.h>
+#include <carnet/fileio.h>
 
 #include "terminal.h"
 
@@ -35,14 +36,29 @@ void Say(const std::string& context, std::string_view text, std::string_view sho
 
 std::string Plural(long n, const char* word);
 
-// Whether the file can be opened for reading, with the reason when not.
-bool Readable(const std::string& path);
+// A book or a table read once, as code page 1252: the file's own bytes, or
+// their conversion from UTF-8 when the input encoding says so.
+class Input {
+public:
+    std::string_view Bytes() const { return m_converted ? std::string_view(m_text) : m_file.View(); }
+    // The bytes before offset are no longer needed.
+    void Release(size_t offset) {
+        if (!m_converted) m_file.Release(offset);
+    }
+    // The file as it was read.
+    const CarnetFileState& State() const { return m_file.State(); }
 
-// The bytes of a text file in code page 1252, converted from UTF-8 when the
-// input encoding says so. kRejected, with a message, on bytes that are not
-// UTF-8 when UTF-8 was asked for, or on a character that code page 1252
+private:
+    friend int ReadInput(const std::string& path, Input& input);
+    CarnetFileBytes m_file;
+    std::string m_text;
+    bool m_converted = false;
+};
+
+// Reads a book or a table. kOk; kRejected, with a message, on bytes that are
+// not UTF-8 when UTF-8 was asked for, or on a character that code page 1252
 // cannot hold; kUnreadable when the file cannot be read.
-int ReadInput(const std::string& path, std::string& cp1252, bool& converted);
+int ReadInput(const std::string& path, Input& input);
 
 // An argument typed at the terminal, as code page 1252: converted when it is
 // valid UTF-8 with characters beyond ASCII, whatever --encoding says of the
@@ -50,20 +66,15 @@ int ReadInput(const std::string& path, std::string& cp1252, bool& converted);
 // character that code page 1252 cannot hold.
 bool FromTerminal(const std::string& what, const std::string& arg, std::string& cp1252);
 
-// The file to hand to the library for `path`: the file itself, or its code
-// page 1252 copy in the scratch folder when it was read as UTF-8. A status
-// as ReadInput gives.
-int SourceOf(const std::string& path, std::string& source);
-
 // Loads a book, its diagnostics on standard error, each after the file's
-// name. kOk, kRejected when lines were rejected (or the input is refused),
-// kUnreadable when the file cannot be read.
-int LoadBook(const std::string& path, CCarnet& book, int& rejected);
+// name. Its option lines go to the scratch folder when `keepOptions` (to be
+// saved or exported), else nowhere. kOk, kRejected when lines were rejected
+// (or the input is refused), kUnreadable when the file cannot be read.
+int LoadBook(const std::string& path, CCarnet& book, int& rejected, bool keepOptions = false);
 
-// Writes an output through a temporary file that `write` fills and that then
-// replaces `target`, or goes to standard output when `target` is empty. The
-// target is untouched unless all went well. kOk or kUnreadable (with a
-// message).
-int WriteOutput(const std::string& target, const std::function<bool(const std::string& path)>& write);
+// Writes an output whole or not at all: to `target` through the library's
+// writer, or to standard output when `target` is empty (made first in an
+// unnamed temporary file). kOk or kUnreadable (with a message).
+int WriteOutput(const std::string& target, const std::function<bool(std::FILE*)>& write);
 
 }  // namespace carnet_tool

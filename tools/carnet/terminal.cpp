@@ -1,5 +1,7 @@
 #include "terminal.h"
 
+#include <dirent.h>
+#include <fcntl.h>
 #include <iconv.h>
 #include <langinfo.h>
 #include <unistd.h>
@@ -7,6 +9,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <clocale>
+#include <cstdint>
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
@@ -87,14 +90,30 @@ Encoding EncodingOfLocale() {
     return encoding;
 }
 
+// Whether any of the 8 bytes from p is beyond ASCII.
+bool AnyHigh8(const char* p) {
+    std::uint64_t word;
+    std::memcpy(&word, p, sizeof word);
+    return (word & 0x8080808080808080ull) != 0;
+}
+
 bool HasHighBytes(std::string_view text) {
-    for (char ch : text)
-        if (static_cast<unsigned char>(ch) >= 0x80) return true;
+    size_t i = 0;
+    for (; i + 8 <= text.size(); i += 8)
+        if (AnyHigh8(text.data() + i)) return true;
+    for (; i < text.size(); ++i)
+        if (static_cast<unsigned char>(text[i]) >= 0x80) return true;
     return false;
 }
 
-bool IsUtf8(std::string_view text, size_t& bad) {
+TextKind KindOf(std::string_view text, size_t& bad) {
+    bool high = false;
     for (size_t i = 0; i < text.size();) {
+        // Runs of ASCII, the whole of most books, eight bytes at a time.
+        if (i + 8 <= text.size() && !AnyHigh8(text.data() + i)) {
+            i += 8;
+            continue;
+        }
         const unsigned char c = static_cast<unsigned char>(text[i]);
         const size_t n = SequenceLength(c);
         bool ok = n > 0 && i + n <= text.size();
@@ -107,11 +126,12 @@ bool IsUtf8(std::string_view text, size_t& bad) {
         }
         if (!ok) {
             bad = i;
-            return false;
+            return TextKind::Other;
         }
+        high = high || n > 1;
         i += n;
     }
-    return true;
+    return high ? TextKind::Utf8 : TextKind::Ascii;
 }
 
 std::string Utf8Of(std::string_view cp1252) {
@@ -153,27 +173,74 @@ std::string ForOutput(std::string_view text, Encoding encoding) {
     return encoding == Encoding::Utf8 ? Utf8Of(text) : std::string(text);
 }
 
+std::string ForDiagnostics(std::string_view text) {
+    constexpr size_t kShown = 200;
+    if (text.size() <= kShown) return std::string(text);
+    const bool line = text.size() > 3 && text.compare(0, 2, " (") == 0 && text.back() == ')';
+    const std::string_view inner = line ? text.substr(2, text.size() - 3) : text;
+    std::string size = std::to_string(inner.size());
+    for (size_t at = size.size(); at > 3; at -= 3) size.insert(at - 3, " ");
+    std::string cut = std::string(line ? " (" : "") + std::string(inner.substr(0, kShown)) + "... (" + size + " bytes)";
+    return line ? cut + ")" : cut;
+}
+
 void StreamWnd::Append(const std::string& text) {
     // Every rejected line is reported by one message that begins so.
     if (text.compare(0, sizeof kRejectedMark - 1, kRejectedMark) == 0) ++m_rejected;
     std::string line = m_prefix;
-    line += ForOutput(text, m_encoding);
+    line += ForOutput(m_cut ? ForDiagnostics(text) : text, m_encoding);
     line += '\n';
     std::fwrite(line.data(), 1, line.size(), m_out);
 }
 
-ScratchStore::ScratchStore() {
+namespace {
+
+// The scratch folder's name where a signal handler can read it.
+char g_scratch[4096];
+
+}  // namespace
+
+const std::string& ScratchStore::Location() {
+    if (!m_folder.empty()) return m_file;
     const char* tmp = std::getenv("TMPDIR");
     std::string pattern = std::string(tmp && *tmp ? tmp : "/tmp") + "/carnet-XXXXXX";
-    if (!::mkdtemp(&pattern[0])) return;
+    if (pattern.size() >= sizeof g_scratch || !::mkdtemp(&pattern[0])) return m_file;
+    std::memcpy(g_scratch, pattern.c_str(), pattern.size() + 1);
     m_folder = pattern;
     m_file = m_folder + "/options.ini";
+    return m_file;
 }
 
 ScratchStore::~ScratchStore() {
     if (m_folder.empty()) return;
+    g_scratch[0] = '\0';
     std::error_code ignored;
     std::filesystem::remove_all(m_folder, ignored);
+}
+
+void RemoveScratch() {
+    if (!g_scratch[0]) return;
+    // The folder holds files only: the options and the stores' temporary files.
+    const int dir = ::open(g_scratch, O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    // Entries removed while the folder is read may hide others: it is read
+    // again until nothing is left to remove.
+    for (int pass = 0, removed = 1; dir >= 0 && removed > 0 && pass < 8; ++pass) {
+        alignas(8) static char entries[4096];
+        removed = 0;
+        ::lseek(dir, 0, SEEK_SET);
+        for (ssize_t n; (n = ::getdents64(dir, entries, sizeof entries)) > 0;) {
+            for (ssize_t at = 0; at < n;) {
+                const auto* entry = reinterpret_cast<const struct dirent64*>(entries + at);
+                const char* name = entry->d_name;
+                if (!(name[0] == '.' && (name[1] == '\0' || (name[1] == '.' && name[2] == '\0'))) &&
+                    ::unlinkat(dir, name, 0) == 0)
+                    ++removed;
+                at += entry->d_reclen;
+            }
+        }
+    }
+    if (dir >= 0) ::close(dir);
+    ::rmdir(g_scratch);
 }
 
 }  // namespace carnet_tool

@@ -25,9 +25,11 @@ Encoding EncodingOfLocale();
 // unassigned become the replacement character.
 std::string Utf8Of(std::string_view cp1252);
 
-// Whether the text is valid UTF-8; `bad` gets the offset of the first byte
-// that is not.
-bool IsUtf8(std::string_view text, size_t& bad);
+// What a text is, told in one pass: plain ASCII, valid UTF-8 with
+// characters beyond ASCII, or neither (`bad` then gets the offset of the
+// first byte that is not UTF-8).
+enum class TextKind { Ascii, Utf8, Other };
+TextKind KindOf(std::string_view text, size_t& bad);
 bool HasHighBytes(std::string_view text);
 
 // A character that code page 1252 cannot hold, met while converting.
@@ -46,11 +48,12 @@ std::string ForOutput(std::string_view text, Encoding encoding);
 
 // A text window that writes every text as a line to a stream as it comes,
 // keeping nothing, so a listing of any length runs in constant memory. It
-// counts the messages that report a rejected line.
+// counts the messages that report a rejected line. Diagnostics are cut
+// (ForDiagnostics).
 class StreamWnd : public CNorvexTxtWnd {
 public:
-    StreamWnd(std::FILE* out, Encoding encoding, std::string prefix = std::string())
-        : m_out(out), m_encoding(encoding), m_prefix(std::move(prefix)) {}
+    StreamWnd(std::FILE* out, Encoding encoding, std::string prefix = std::string(), bool cut = false)
+        : m_out(out), m_encoding(encoding), m_prefix(std::move(prefix)), m_cut(cut) {}
 
     int Rejected() const { return m_rejected; }
 
@@ -61,28 +64,37 @@ private:
     std::FILE* m_out;
     Encoding m_encoding;
     std::string m_prefix;
+    bool m_cut;
     int m_rejected = 0;
 };
 
-// A fresh temporary folder, removed with all it holds. Option lines read from
-// a book go to a profile file there instead of the user's settings, and are
-// written back from there when the book is saved; books converted from UTF-8
-// and exports being written wait there too.
+// A diagnostic no longer than a terminal can show: a text beyond 200 bytes
+// is cut there and its length said, "... (104 857 600 bytes)"; a rejected
+// line shown as " (LINE)" keeps its parentheses, and the length is its own.
+std::string ForDiagnostics(std::string_view text);
+
+// A fresh temporary folder, made when first asked for and removed with all it
+// holds, also by RemoveScratch when a signal ends the tool. Option lines read
+// from a book that is to be saved or exported go to a profile file there
+// instead of the user's settings, and are written back from there.
 class ScratchStore {
 public:
-    ScratchStore();
+    ScratchStore() = default;
     ~ScratchStore();
     ScratchStore(const ScratchStore&) = delete;
     ScratchStore& operator=(const ScratchStore&) = delete;
 
-    bool IsReady() const { return !m_folder.empty(); }
-    const std::string& Location() const { return m_file; }
-    // A path in the folder.
-    std::string PathOf(const std::string& name) const { return m_folder + "/" + name; }
+    // The profile file in the folder, made now if need be; empty when no
+    // folder can be made.
+    const std::string& Location();
 
 private:
     std::string m_folder;
     std::string m_file;
 };
+
+// Removes the scratch folder and what it holds: async-signal-safe, for a
+// handler that then ends the tool.
+void RemoveScratch();
 
 }  // namespace carnet_tool
