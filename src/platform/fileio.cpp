@@ -18,12 +18,14 @@ namespace {
 
 int Fail(int err) { return err ? err : EIO; }
 
+long long Nanoseconds(const struct timespec& t) { return static_cast<long long>(t.tv_sec) * 1000000000LL + t.tv_nsec; }
+
 CarnetFileState StateOf(const struct stat& st) {
     CarnetFileState state;
     state.device = st.st_dev;
     state.inode = st.st_ino;
     state.size = st.st_size;
-    state.modified = static_cast<long long>(st.st_mtim.tv_sec) * 1000000000LL + st.st_mtim.tv_nsec;
+    state.modified = Nanoseconds(st.st_mtim);
     return state;
 }
 
@@ -57,18 +59,19 @@ mode_t CurrentUmask() {
     return mask;
 }
 
-// When this process started, in seconds since the epoch; 0 when unknown (no
-// temporary file then counts as left by an ended process).
-std::time_t ProcessStart() {
-    static const std::time_t start = [] {
-        long long ticks = -1, boot = -1;
+// When this process started, in nanoseconds since the epoch, to the clock
+// tick; 0 when unknown (no temporary file then counts as left by an ended
+// process).
+long long ProcessStart() {
+    static const long long start = [] {
+        long long ticks = -1;
         if (std::FILE* f = std::fopen("/proc/self/stat", "r")) {
             std::string text;
             char chunk[512];
             for (size_t n; (n = std::fread(chunk, 1, sizeof chunk, f)) > 0;) text.append(chunk, n);
             std::fclose(f);
             // The command name may hold anything up to its last ')'; the
-            // start time is the 20th field after it.
+            // start time, in ticks since the boot, is the 20th field after it.
             const std::string::size_type close = text.rfind(')');
             const char* p = close == std::string::npos ? nullptr : text.c_str() + close + 1;
             for (int field = 0; p && field < 20; ++field) {
@@ -77,15 +80,12 @@ std::time_t ProcessStart() {
                 while (*p && *p != ' ') ++p;
             }
         }
-        if (std::FILE* f = std::fopen("/proc/stat", "r")) {
-            char tag[64];
-            while (std::fscanf(f, "%63s", tag) == 1)
-                if (std::string(tag) == "btime" && std::fscanf(f, "%lld", &boot) == 1) break;
-            std::fclose(f);
-        }
         const long hz = ::sysconf(_SC_CLK_TCK);
-        if (ticks < 0 || boot < 0 || hz <= 0) return std::time_t{0};
-        return static_cast<std::time_t>(boot + ticks / hz);
+        struct timespec now, sinceBoot;
+        if (ticks < 0 || hz <= 0 || ::clock_gettime(CLOCK_REALTIME, &now) != 0 ||
+            ::clock_gettime(CLOCK_BOOTTIME, &sinceBoot) != 0)
+            return 0LL;
+        return Nanoseconds(now) - Nanoseconds(sinceBoot) + ticks * (1000000000LL / hz);
     }();
     return start;
 }
@@ -129,7 +129,7 @@ std::string TemporaryPrefix(const std::string& name) {
 // Removes the temporary files of the same name that an ended process left:
 // ours, older than this process, and not locked by a write under way.
 void RemoveLeftovers(const std::string& folder, const std::string& prefix) {
-    const std::time_t start = ProcessStart();
+    const long long start = ProcessStart();
     DIR* dir = start > 0 ? ::opendir(folder.c_str()) : nullptr;
     if (!dir) return;
     const int dfd = ::dirfd(dir);
@@ -138,7 +138,7 @@ void RemoveLeftovers(const std::string& folder, const std::string& prefix) {
         if (name.size() != prefix.size() + 6 || name.compare(0, prefix.size(), prefix) != 0) continue;
         struct stat st;
         if (::fstatat(dfd, name.c_str(), &st, AT_SYMLINK_NOFOLLOW) != 0 || !S_ISREG(st.st_mode) ||
-            st.st_uid != ::geteuid() || st.st_mtime >= start)
+            st.st_uid != ::geteuid() || Nanoseconds(st.st_mtim) >= start)
             continue;
         const int fd = ::openat(dfd, name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC);
         if (fd < 0) continue;

@@ -7,12 +7,15 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <cerrno>
+
 #include <filesystem>
 #include <functional>
 #include <string>
 #include <vector>
 
 #include <carnet/carnet.h>
+#include <carnet/fileio.h>
 
 #include "fault_fixture.h"
 #include "save_fixture.h"
@@ -194,26 +197,120 @@ TEST_F(IoFaults, FailedSavesTouchNoFile) {
     EXPECT_FALSE(std::filesystem::exists(Path("neuf.geo")));
 }
 
-TEST_F(IoFaults, AFailedBackUpSaysNothingAndKeepsEveryFile) {
+TEST_F(IoFaults, WhatStandsAtTheBackupNameIsNeverFollowedNorWrittenTo) {
     CCarnet book;
     book.m_FileName = Path("chantier.geo");
     WriteFile(book.m_FileName.str(), "Station S1 1.5\n");
-    if (!MakeDevice(Path("chantier.sbk"), Device::Full)) GTEST_SKIP() << "no device node can be made here";
-    // The backup goes to a device: written to, never replaced; a full one
-    // refuses the bytes.
-    book.BackUp();
-    EXPECT_TRUE(IsDevice(Path("chantier.sbk")));
-    EXPECT_EQ(ReadFile(book.m_FileName.str()), "Station S1 1.5\n");
-
-    // A backup where permissions count: the folder refuses the new file.
-    std::filesystem::remove(Path("chantier.sbk"));
-    ASSERT_EQ(::chmod(Dir().c_str(), 0555), 0);
-    const int failures = WithoutPrivileges([&] {
+    WriteFile(Path("autre.txt"), "autre\n");
+    const struct {
+        const char* what;
+        std::function<bool(const std::string&)> make;
+        int error;
+    } cases[] = {
+        {"a folder", [](const std::string& p) { return ::mkdir(p.c_str(), 0755) == 0; }, EISDIR},
+        {"a pipe", [](const std::string& p) { return ::mkfifo(p.c_str(), 0644) == 0; }, EINVAL},
+        {"a device", [](const std::string& p) { return MakeDevice(p, Device::Zero); }, EINVAL},
+        {"a link to /dev/zero", [](const std::string& p) { return ::symlink("/dev/zero", p.c_str()) == 0; }, ELOOP},
+        {"a link to a file", [this](const std::string& p) { return ::symlink(Path("autre.txt").c_str(), p.c_str()) == 0; },
+         ELOOP},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.what);
+        std::filesystem::remove_all(Path("chantier.sbk"));
+        if (!c.make(Path("chantier.sbk"))) continue;  // no device node here
+        int error = 0;
+        EXPECT_EQ(book.TryBackUp(&error), -1);
+        EXPECT_EQ(error, c.error);
         book.BackUp();
-        return 0;
-    });
+        struct stat st;
+        ASSERT_EQ(::lstat(Path("chantier.sbk").c_str(), &st), 0);
+        EXPECT_FALSE(S_ISREG(st.st_mode));
+    }
+    EXPECT_EQ(ReadFile(book.m_FileName.str()), "Station S1 1.5\n");
+    EXPECT_EQ(ReadFile(Path("autre.txt")), "autre\n");
+
+    // The name rule stays within the file name; a book named as its own
+    // backup gets none.
+    const std::pair<const char*, const char*> names[] = {{"d/ab", "d/ab.sbk"}, {"d/x", "d/x.sbk"}, {"d/abc", "d/sbk"},
+                                                         {"d/x.sbk", nullptr}};
+    std::filesystem::create_directory(Path("d"));
+    for (const auto& [name, backup] : names) {
+        book.m_FileName = Path(name);
+        WriteFile(Path(name), "Station S2 1.5\n");
+        int error = 0;
+        EXPECT_EQ(book.TryBackUp(&error), backup ? 1 : -1) << name;
+        if (backup) {
+            EXPECT_EQ(ReadFile(Path(backup)), "Station S2 1.5\n");
+        } else {
+            EXPECT_EQ(error, EEXIST);
+        }
+    }
+    EXPECT_EQ(Entries(Path("d")), (std::vector<std::string>{"ab", "ab.sbk", "abc", "sbk", "x", "x.sbk"}));
+
+    // Where permissions count, a folder that refuses the new file.
+    book.m_FileName = Path("chantier.geo");
+    std::filesystem::remove_all(Path("chantier.sbk"));
+    ASSERT_EQ(::chmod(Dir().c_str(), 0555), 0);
+    const int made = WithoutPrivileges([&] { return book.TryBackUp() + 1; });
     ASSERT_EQ(::chmod(Dir().c_str(), 0755), 0);
-    EXPECT_EQ(failures, 0);
-    EXPECT_EQ(Entries(Dir()), std::vector<std::string>{"chantier.geo"});
+    EXPECT_EQ(made, 0);
+    EXPECT_FALSE(std::filesystem::exists(Path("chantier.sbk")));
     EXPECT_TRUE(m_boxes.boxes.empty());
+}
+
+TEST_F(IoFaults, NoWriterFollowsALinkThatAnotherUserPlantedInAStickyFolder) {
+    // A shared folder, a file of the user "nobody" elsewhere, and links to it
+    // that a third user planted in the folder under the names nobody writes.
+    const std::string shared = Path("partage"), home = Path("maison"), victim = home + "/victime.txt";
+    ASSERT_EQ(::mkdir(shared.c_str(), 0755), 0);
+    ASSERT_EQ(::chmod(shared.c_str(), 01777), 0);
+    ASSERT_EQ(::mkdir(home.c_str(), 0755), 0);
+    WriteFile(victim, "a moi\n");
+    WriteFile(shared + "/chantier.geo", "Station S1 1.5\n");
+    for (const std::string& file : {home, victim, shared + "/chantier.geo"})
+        ASSERT_EQ(::chown(file.c_str(), 65534, 65534), 0);
+    for (const char* name : {"chantier.sbk", "sortie.geo", "params.ini", "brut.txt"}) {
+        const std::string link = shared + "/" + name;
+        ASSERT_EQ(::symlink(victim.c_str(), link.c_str()), 0);
+        ASSERT_EQ(::lchown(link.c_str(), 12345, 12345), 0);
+    }
+    // A link that nobody planted is followed.
+    ASSERT_EQ(::symlink(victim.c_str(), (shared + "/mien.txt").c_str()), 0);
+    ASSERT_EQ(::lchown((shared + "/mien.txt").c_str(), 65534, 65534), 0);
+    const int failures = WithoutPrivileges([&] {
+        CCarnet book;
+        book.m_FileName = shared + "/chantier.geo";
+        int bits = book.TryBackUp() != -1 ? 1 : 0;
+        bits |= book.Save(shared + "/sortie.geo", nullptr, false) != 0 ? 2 : 0;
+        bits |= SetParamString((shared + "/params.ini").c_str(), "S", "k", "v") != 0 ? 4 : 0;
+        auto fill = [](std::FILE* f) { return std::fputs("pris\n", f) >= 0 ? 0 : EIO; };
+        bits |= CarnetWriteFile((shared + "/brut.txt").c_str(), fill) != EACCES ? 8 : 0;
+        bits |= ReadFile(victim) != "a moi\n" ? 16 : 0;
+        bits |= CarnetWriteFile((shared + "/mien.txt").c_str(), fill) != 0 ? 32 : 0;
+        return bits;
+    });
+    EXPECT_EQ(failures, 0);
+    EXPECT_EQ(ReadFile(victim), "pris\n");
+}
+
+TEST_F(IoFaults, ABookFileThatSomeoneWroteSinceItWasReadIsNotReplaced) {
+    CCarnet book;
+    Fill(book);
+    const std::string file = book.m_FileName.str();
+    // Another program appends a line: the save is refused, the line kept.
+    const std::string appended = ReadFile(file) + "Commentaire ajout\n";
+    WriteFile(file, appended);
+    EXPECT_EQ(book.Save(file, nullptr, false), 0);
+    EXPECT_EQ(m_boxes.boxes, std::vector<std::string>{CannotSave(file)});
+    EXPECT_EQ(ReadFile(file), appended);
+    // Loaded again, saved twice: each save stands for the file it wrote.
+    ASSERT_EQ(book.Load(nullptr, file, m_params, 0, nullptr), 1);
+    EXPECT_EQ(book.Save(file, nullptr, false), 1);
+    EXPECT_EQ(book.Save(file, nullptr, true), 1);
+    // Another file than the book's own has no version to keep from.
+    EXPECT_EQ(book.Save(Path("copie.geo"), nullptr, false), 1);
+    // A name that fills the file name's limit still saves.
+    const std::string longest = Path(std::string(251, 'n') + ".geo");
+    EXPECT_EQ(book.Save(longest, nullptr, false), 1);
+    EXPECT_EQ(ReadFile(longest), ReadFile(Path("copie.geo")));
 }

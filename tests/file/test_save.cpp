@@ -268,10 +268,13 @@ TEST_F(Save, BackUpCopiesEveryByteBesideTheFile) {
         book.BackUp();
         EXPECT_EQ(ReadFile(Path(c.backup)), bytes) << c.name;
         EXPECT_EQ(ModeOf(Path(c.backup)), 0600);
-        // A second backup replaces the first.
+        // A second backup replaces the first, with the book's permissions.
         WriteFile(book.m_FileName.str(), "nouveau\n");
+        ASSERT_EQ(::chmod(book.m_FileName.GetString(), 0640), 0);
+        ASSERT_EQ(::chmod(Path(c.backup).c_str(), 0666), 0);
         book.BackUp();
         EXPECT_EQ(ReadFile(Path(c.backup)), "nouveau\n") << c.name;
+        EXPECT_EQ(ModeOf(Path(c.backup)), 0640);
     }
     EXPECT_EQ(Entries(Dir()).size(), 6u);
 }

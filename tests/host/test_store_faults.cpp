@@ -80,6 +80,22 @@ TEST_F(StoreFaults, ADeviceIsNeitherReadNorReplaced) {
     EXPECT_EQ(store_test::Entries(Dir()), (std::vector<std::string>{"full.ini", "null.ini", "zero.ini"}));
 }
 
+TEST_F(StoreFaults, ARegistryRootThatIsNoFileGivesTheDefaultsAtOnce) {
+    // A pipe would block the read, /dev/zero never end it.
+    std::filesystem::create_directories(RegistryFolder());
+    ASSERT_EQ(::mkfifo((RegistryFolder() + "/HKEY_CURRENT_USER.txt").c_str(), 0600), 0);
+    ASSERT_EQ(::symlink("/dev/zero", (RegistryFolder() + "/HKEY_USERS.txt").c_str()), 0);
+    for (const std::string root : {"HKEY_CURRENT_USER", "HKEY_USERS"}) {
+        SCOPED_TRACE(root);
+        EXPECT_EQ(StoredRadius(root + "\\Software\\Carnet"), 6366.0);
+        EXPECT_EQ(SetParamDouble((root + "\\Software\\Carnet").c_str(), "Options_Corrections", "RayonTerre", 6400.0), 0);
+    }
+    struct stat st;
+    EXPECT_TRUE(::stat((RegistryFolder() + "/HKEY_CURRENT_USER.txt").c_str(), &st) == 0 && S_ISFIFO(st.st_mode));
+    EXPECT_TRUE(::lstat((RegistryFolder() + "/HKEY_USERS.txt").c_str(), &st) == 0 && S_ISLNK(st.st_mode));
+    EXPECT_TRUE(m_boxes.empty());
+}
+
 TEST_F(StoreFaults, StoresThatMayNotBeTouchedKeepTheirBytes) {
     const std::string profile = Path("params.ini");
     const std::string text = "[Options_Corrections]\nRayonTerre=6400.000000\n";

@@ -5,6 +5,10 @@
 
 #include <sys/stat.h>
 #include <sys/wait.h>
+#include <unistd.h>
+
+#include <csignal>
+#include <cstdio>
 
 #include <algorithm>
 #include <cstdlib>
@@ -395,6 +399,22 @@ const Case kCases[] = {
      "$W/absent/c.svg: cannot write: No such file or directory; nothing written\n", {}},
     {"an export to a full disk says so", "export $EX --to dxf -o /dev/full", {}, 2, "",
      "/dev/full: cannot write: No space left on device; nothing written\n", {}},
+    {"check reports a line holding a NUL byte", "check $W/n.geo",
+     {{"n.geo", std::string("Commentaire abc\0def\nStation S1 1.5\n", 35)}}, 1,
+     "$W/n.geo: 1 element loaded, 1 line rejected\n",
+     "$W/n.geo: Erreur ligne 1 : ligne endommag\xE9" "e (octet nul) !\n$W/n.geo:  (Commentaire abc\\0def)\n", {}},
+    {"a long rejected line is shown cut, its length said", "check $W/x.geo", {{"x.geo", std::string(300, 'x')}}, 1,
+     "...\n",
+     "$W/x.geo: Erreur ligne 1 : commande <" + std::string(173, 'x') + "... (341 bytes)\n$W/x.geo:  (" +
+         std::string(200, 'x') + "... (300 bytes))\n", {}},
+    {"an input without end is refused", "check /dev/zero", {}, 2, "/dev/zero: not read\n",
+     "/dev/zero: cannot read: not a regular file, and longer than 256 MiB\n", {}},
+    {"the backup of a short name adds .sbk", "format --backup $W/ab", {{"ab", Example()}}, 0, "", "",
+     {{"ab", Example()}, {"ab.sbk", Example()}}},
+    {"a book named as its own backup is not written", "format --backup $W/x.sbk", {{"x.sbk", Example()}}, 2, "",
+     "$W/x.sbk: cannot back up to $W/x.sbk (the book's own name is its backup's); nothing written\n", {}},
+    {"a name as long as a file name may be saves", "format $W/" + std::string(251, 'n') + ".geo",
+     {{std::string(251, 'n') + ".geo", Example()}}, 0, "", "", {{std::string(251, 'n') + ".geo", Example()}}},
     {"no subcommand prints the help", "", {}, 0, "carnet: inspect, query, convert and export land-surveying field books (.geo files)\n...\n", "", {}},
     {"a usage error", "export $EX --to pdf", {}, 2, "",
      "carnet: --to: pdf not in {csv,geojson,dxf,svg}\ncarnet --help tells how to use it\n", {}},
@@ -557,4 +577,137 @@ TEST_F(Tool, LargeGeneratedBook) {
               "20000 20000\n");
     const std::string dxf = ReadFile(Path("work/big.dxf"));
     EXPECT_EQ(dxf.substr(dxf.size() - 4), "EOF\n");
+}
+
+// Every command that writes to standard output fails, with a message, when
+// the output is full or closed.
+TEST_F(Tool, AFullOrClosedOutputIsAFailure) {
+    for (const char* command : {"check $EX", "list $EX", "show $EX", "find $EX S1", "next $EX", "select $EX S1",
+                                "options", "projection $EX", "interpret Cercle_R CER/L12/250"}) {
+        for (const auto& [output, reason] : {std::pair<const char*, const char*>{">/dev/full", "No space left on device"},
+                                             {">&-", "Bad file descriptor"}}) {
+            SCOPED_TRACE(std::string(command) + " " + output);
+            const Outcome run = Carnet(std::string(command) + " " + output);
+            EXPECT_EQ(run.status, 2);
+            EXPECT_EQ(run.err, std::string("carnet: cannot write to standard output: ") + reason + "\n");
+        }
+    }
+}
+
+namespace {
+
+// The entries of a folder whose names begin so.
+size_t Named(const std::string& folder, const std::string& prefix) {
+    size_t n = 0;
+    for (const std::string& name : Entries(folder)) n += name.compare(0, prefix.size(), prefix) == 0;
+    return n;
+}
+
+// Starts the tool on its own; its pid.
+pid_t Start(const std::vector<std::string>& args) {
+    const pid_t pid = ::fork();
+    if (pid == 0) {
+        std::vector<char*> argv{const_cast<char*>(CARNET_TOOL)};
+        for (const std::string& a : args) argv.push_back(const_cast<char*>(a.c_str()));
+        argv.push_back(nullptr);
+        ::freopen("/dev/null", "w", stderr);
+        ::execv(CARNET_TOOL, argv.data());
+        ::_exit(127);
+    }
+    return pid;
+}
+
+// Waits until the folder holds the temporary file of a save (10 s at most).
+bool SaveUnderWay(const std::string& folder) {
+    for (int i = 0; i < 20000 && Named(folder, ".carnet.") == 0; ++i) ::usleep(500);
+    return Named(folder, ".carnet.") > 0;
+}
+
+std::string Lines(int n, const char* text) {
+    std::string lines;
+    for (int i = 0; i < n; ++i) lines += text + std::to_string(i) + "\n";
+    return lines;
+}
+
+}  // namespace
+
+// A signal ends a save with its temporary files removed; a save after one
+// that was killed removes what it left; a reader that stops reading ends
+// the tool quietly.
+TEST_F(Tool, SignalsLeaveNoTemporaryFile) {
+    const std::string book = Lines(1000000, "Station S1 1.5 "), file = Path("work/big.geo");
+    WriteFile(file, book);
+    ::mkdir(Path("tmp").c_str(), 0755);
+    ::setenv("TMPDIR", Path("tmp").c_str(), 1);
+    for (int sig : {SIGINT, SIGTERM, SIGHUP, SIGKILL}) {
+        SCOPED_TRACE(sig);
+        const pid_t pid = Start({"format", file});
+        ASSERT_TRUE(SaveUnderWay(Path("work")));
+        ::kill(pid, sig);
+        int status = 0;
+        ASSERT_EQ(::waitpid(pid, &status, 0), pid);
+        EXPECT_TRUE(WIFSIGNALED(status) && WTERMSIG(status) == sig);
+        EXPECT_EQ(Named(Path("work"), ".carnet."), sig == SIGKILL ? 1u : 0u);
+        EXPECT_EQ(Entries(Path("tmp")).size(), sig == SIGKILL ? 1u : 0u);
+    }
+    EXPECT_EQ(ReadFile(file), book);
+    ::usleep(20000);  // the leftovers are older than the next run
+    EXPECT_EQ(Carnet("format --backup $W/big.geo").status, 0);
+    EXPECT_EQ(Entries(Path("work")), (std::vector<std::string>{"big.geo", "big.sbk"}));
+    EXPECT_TRUE(Entries(Path("tmp")).empty());
+    // The reader of a listing or an export goes away after one line.
+    for (const char* command : {" list ", " show "}) {
+        const std::string cmd = std::string(CARNET_TOOL) + command + file + " 2>" + Path("err.txt") + " | head -1 >/dev/null";
+        EXPECT_EQ(std::system(cmd.c_str()), 0);
+        EXPECT_EQ(ReadFile(Path("err.txt")), "") << command;
+        EXPECT_TRUE(Entries(Path("tmp")).empty()) << command;
+    }
+    ::unsetenv("TMPDIR");
+}
+
+// Another program appends to the book while it is formatted: the save is
+// refused, or made before the lines come; none is lost.
+TEST_F(Tool, AWriterAppendingMeanwhileLosesNothing) {
+    const std::string file = Path("work/w.geo"), book = Lines(500000, "Commentaire ligne ");
+    WriteFile(file, book);
+    const pid_t appender = ::fork();
+    if (appender == 0) {
+        const bool started = SaveUnderWay(Path("work"));
+        for (int i = 0; started && i < 20; ++i) {
+            std::FILE* f = std::fopen(file.c_str(), "a");
+            if (f) std::fprintf(f, "Commentaire ajout %d\n", i);
+            if (f) std::fclose(f);
+        }
+        ::_exit(started ? 0 : 1);
+    }
+    const Outcome run = Carnet("format $W/w.geo");
+    int status = 0;
+    ASSERT_EQ(::waitpid(appender, &status, 0), appender);
+    ASSERT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
+    const std::string after = ReadFile(file);
+    for (int i = 0; i < 20; ++i) EXPECT_NE(after.find("Commentaire ajout " + std::to_string(i) + "\n"), std::string::npos);
+    if (run.status != 0) {
+        EXPECT_EQ(run.status, 2);
+        EXPECT_NE(run.err.find(file + ": changed since it was read (another program wrote to it); nothing written"),
+                  std::string::npos)
+            << run.err;
+        EXPECT_EQ(after.substr(0, book.size()), book);
+    }
+}
+
+// Memory that runs out is a message, not an abort.
+TEST_F(Tool, OutOfMemoryIsAMessage) {
+#if defined(__SANITIZE_ADDRESS__)
+    GTEST_SKIP() << "the sanitizers need more address space than the limit leaves";
+#elif defined(__has_feature)
+#if __has_feature(address_sanitizer)
+    GTEST_SKIP() << "the sanitizers need more address space than the limit leaves";
+#endif
+#endif
+    WriteFile(Path("work/big.geo"), Lines(2000000, "Commentaire ligne "));
+    const std::string cmd = "ulimit -v 150000; " + std::string(CARNET_TOOL) + " check " + Path("work/big.geo") +
+                            " >/dev/null 2>" + Path("err.txt");
+    const int raw = std::system(cmd.c_str());
+    EXPECT_TRUE(WIFEXITED(raw) && WEXITSTATUS(raw) == 2);
+    EXPECT_EQ(ReadFile(Path("err.txt")), "carnet: out of memory\n");
 }

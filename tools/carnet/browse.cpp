@@ -54,7 +54,7 @@ int Check(const std::vector<std::string>& files) {
         else
             std::printf("%s: %s loaded, %s rejected\n", path.c_str(), Plural(book.length(), "element").c_str(),
                         Plural(rejected, "line").c_str());
-        std::fflush(stdout);
+        FlushOutput();
     }
     return status;
 }

@@ -27,10 +27,11 @@ bool BackedUp(CCarnet& book) {
     int err = 0;
     if (book.TryBackUp(&err) >= 0) return true;
     const std::string backup = book.BackUpName().str();
-    const std::string why = err == EEXIST ? "the book's own name is its backup's"
-                            : err == ELOOP || err == EISDIR || err == EINVAL
-                                ? backup + " is not a regular file"
-                                : std::string(std::strerror(err));
+    const std::string why = err == EEXIST   ? "the book's own name is its backup's"
+                            : err == ELOOP  ? backup + " is a link"
+                            : err == EISDIR ? backup + " is a folder"
+                            : err == EINVAL ? backup + " is not a regular file"
+                                            : std::string(std::strerror(err));
     Say(book.m_FileName.str(), "cannot back up to " + backup + " (" + why + "); nothing written");
     return false;
 }

@@ -97,9 +97,8 @@ void EndOnSignals() {
 // Every command ends by checking that what it wrote to standard output got
 // there: a full disk or a closed output is a failure, not a silent success.
 int Finish(int status) {
-    errno = 0;
-    if (std::fflush(stdout) == 0 && !std::ferror(stdout)) return status;
-    Say("carnet", std::string("cannot write to standard output: ") + std::strerror(errno ? errno : EIO));
+    if (FlushOutput()) return status;
+    Say("carnet", std::string("cannot write to standard output: ") + std::strerror(CurrentSession().outputError));
     return kUnreadable;
 }
 

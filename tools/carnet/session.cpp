@@ -45,8 +45,15 @@ Session& CurrentSession() {
     return session;
 }
 
+bool FlushOutput() {
+    int& error = CurrentSession().outputError;
+    errno = 0;
+    if ((std::fflush(stdout) != 0 || std::ferror(stdout)) && error == 0) error = errno ? errno : EIO;
+    return error == 0;
+}
+
 void Say(const std::string& context, std::string_view text, std::string_view shown) {
-    std::fflush(stdout);
+    FlushOutput();
     std::string line = context + ": " + ForOutput(ForDiagnostics(text), CurrentSession().output);
     std::replace(line.begin(), line.end(), '\n', ' ');
     line += shown;
@@ -62,7 +69,8 @@ int ReadInput(const std::string& path, Input& input) {
     input.m_converted = false;
     input.m_text.clear();
     if (const int err = input.m_file.Read(path.c_str())) {
-        Say(path, std::string("cannot read: ") + std::strerror(err));
+        Say(path, std::string("cannot read: ") +
+                      (err == EFBIG ? "not a regular file, and longer than 256 MiB" : std::strerror(err)));
         return kUnreadable;
     }
     const std::string_view bytes = input.m_file.View();
@@ -119,7 +127,7 @@ int LoadBook(const std::string& path, CCarnet& book, int& rejected, bool keepOpt
     const int read = ReadInput(path, input);
     if (read != kOk) return read;
     StreamWnd diagnostics(stderr, session.output, path + ": ", true);
-    std::fflush(stdout);
+    FlushOutput();
     session.context = path;
     book.LoadBytes(&diagnostics, input.Bytes(), location, 0, [&input](size_t done) { input.Release(done); });
     book.m_FileName = path;
@@ -140,11 +148,11 @@ int WriteOutput(const std::string& target, const std::function<bool(std::FILE*)>
             err = errno ? errno : EIO;
         } else {
             std::rewind(temp.get());
-            std::fflush(stdout);
+            FlushOutput();
             char chunk[1 << 16];
             for (size_t n; err == 0 && (n = std::fread(chunk, 1, sizeof chunk, temp.get())) > 0;)
                 if (std::fwrite(chunk, 1, n, stdout) != n) err = errno ? errno : EIO;
-            if (err == 0 && std::fflush(stdout) != 0) err = errno ? errno : EIO;
+            if (err == 0 && !FlushOutput()) err = CurrentSession().outputError;
         }
     } else {
         err = CarnetWriteFile(target.c_str(), [&write](std::FILE* f) {

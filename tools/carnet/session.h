@@ -25,9 +25,14 @@ struct Session {
     Encoding output = Encoding::Cp1252;   // of the texts shown
     ScratchStore store;
     std::string context = "carnet";       // what the library's messages are about
+    int outputError = 0;                  // of the first write to standard output that failed
 };
 
 Session& CurrentSession();
+
+// Flushes standard output; false when it has failed, now or before (the
+// errno of the first failure is kept in the session).
+bool FlushOutput();
 
 // A message on standard error after "CONTEXT: "; `text` is code page 1252,
 // shown in the output encoding, its line breaks made blanks; `shown` follows

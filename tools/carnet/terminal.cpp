@@ -4,10 +4,12 @@
 #include <fcntl.h>
 #include <iconv.h>
 #include <langinfo.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
+#include <csignal>
 #include <clocale>
 #include <cstdint>
 #include <cstdlib>
@@ -198,12 +200,31 @@ namespace {
 // The scratch folder's name where a signal handler can read it.
 char g_scratch[4096];
 
+// Removes the scratch folders that ended runs left (killed, so that no
+// handler could run): ours, named after a process that no longer exists.
+void RemoveLeftScratch(const std::string& parent) {
+    std::error_code ignored;
+    for (const auto& entry : std::filesystem::directory_iterator(parent, ignored)) {
+        const std::string name = entry.path().filename().string();
+        char* end = nullptr;
+        const long pid = name.compare(0, 7, "carnet-") == 0 ? std::strtol(name.c_str() + 7, &end, 10) : 0;
+        struct stat st;
+        if (pid <= 0 || !end || *end != '-' || std::strlen(end) != 7 || ::lstat(entry.path().c_str(), &st) != 0 ||
+            !S_ISDIR(st.st_mode) || st.st_uid != ::geteuid() || ::kill(static_cast<pid_t>(pid), 0) == 0 ||
+            errno != ESRCH)
+            continue;
+        std::filesystem::remove_all(entry.path(), ignored);
+    }
+}
+
 }  // namespace
 
 const std::string& ScratchStore::Location() {
     if (!m_folder.empty()) return m_file;
     const char* tmp = std::getenv("TMPDIR");
-    std::string pattern = std::string(tmp && *tmp ? tmp : "/tmp") + "/carnet-XXXXXX";
+    const std::string parent = tmp && *tmp ? tmp : "/tmp";
+    RemoveLeftScratch(parent);
+    std::string pattern = parent + "/carnet-" + std::to_string(::getpid()) + "-XXXXXX";
     if (pattern.size() >= sizeof g_scratch || !::mkdtemp(&pattern[0])) return m_file;
     std::memcpy(g_scratch, pattern.c_str(), pattern.size() + 1);
     m_folder = pattern;
