@@ -33,6 +33,11 @@ MEMORY_GOAL = 3.0
 PER_CALL = ("BM_IsPointInSel", "BM_FormMatNormalise", "BM_FormMatBuild", "BM_InitCode", "BM_Interprete",
             "BM_FindRepAtEveryStation")
 
+# The selection matcher: its cost must grow with the logarithm of the number
+# of groups, not with the number (cpu time, from 10 groups to each count).
+SELECT_GROUPS = (10, 100, 1000)
+SELECT_GROWTH_GOAL = 2.0
+
 TO_NS = {"ns": 1.0, "us": 1e3, "ms": 1e6, "s": 1e9}
 
 
@@ -163,6 +168,17 @@ def main(argv):
         table.add(size, f"{run.get('file_bytes', 0) / 1e6:.1f}", fmt(run.get("peak_bytes_per_element"), 0),
                   fmt(peak), status(peak, MEMORY_GOAL), f"<= {MEMORY_GOAL}")
     table.show(("elements", "file MB", "peak bytes/element", "peak / file", "", "goal"))
+
+    print("Selection matched against every element of the 100 000-element book (ms)")
+    few = runs.get(f"BM_SelectMatcher/{SELECT_GROUPS[0]}")
+    for groups in SELECT_GROUPS:
+        m, p = runs.get(f"BM_SelectMatcher/{groups}"), runs.get(f"BM_SelectIsPointInSel/{groups}")
+        if not m:
+            continue
+        g = ns(m, "cpu") / ns(few, "cpu") if few else None
+        table.add(groups, fmt(ns(m, "cpu") / 1e6), fmt(ns(p, "cpu") / 1e6) if p else "-", fmt(g),
+                  status(g, SELECT_GROWTH_GOAL), f"<= {SELECT_GROWTH_GOAL}")
+    table.show(("groups", "matcher", "IsPointInSel per element", f"matcher / {SELECT_GROUPS[0]} groups", "", "goal"))
 
     print("Time per call (ns)")
     for name in PER_CALL:

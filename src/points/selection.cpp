@@ -1,13 +1,21 @@
 // Selection strings ("1-5;8;P.1-P.20;A.*"): validation into canonical form,
 // membership and counting, and the point-number field of a dialog.
+#include <algorithm>
 #include <climits>
 #include <cstdlib>
+#include <map>
+#include <set>
+#include <string>
+#include <tuple>
+#include <unordered_map>
 #include <utility>
+#include <vector>
 
 #include <carnet/ccarnet.h>
 #include <carnet/cwnd.h>
 #include <carnet/messages.h>
 #include <carnet/msgbox.h>
+#include <carnet/selmatch.h>
 
 namespace {
 
@@ -171,6 +179,81 @@ int CCarnet::IsPointInSel(const CString& np, const CString& sel) {
         return !match;
     });
     return found ? 1 : 0;
+}
+
+// The groups of a selection in one mode, sorted for lookup. Each follows the
+// rule of IsPointInSel: a range matches the numbers between its ends of its
+// first end's radical (and set-up); a single group matches its radical (any
+// for "*"), its number (any for -1), its dotted flag (and set-up).
+struct CSelMatcher::Index {
+    // What the groups say of one radical; set-ups are 0 for plain numbers.
+    struct Radical {
+        std::set<std::tuple<int, int, int>> singles;                   // number (-1: any), dotted, set-up
+        std::map<int, std::vector<std::pair<long long, long long>>> ranges;  // by set-up, merged, in order
+    };
+    std::unordered_map<std::string, Radical> radicals;
+    Radical anyRadical;  // the single groups of radical "*"
+
+    Index(const CString& sel, bool station) {
+        const auto setUp = [station](const SelPoint& p) { return station ? p.rep : 0; };
+        ForEachGroup(sel, [&](const CString& group) {
+            if (group.IsEmpty()) return true;
+            const int dash = group.Find('-');
+            if (dash >= 0) {
+                const Range range(group, dash);
+                const SelPoint a = Split(range.first, station), b = Split(range.second, station);
+                if ((!station || a.rep == b.rep) && a.number <= b.number)
+                    radicals[a.radical.str()].ranges[setUp(a)].emplace_back(a.number, b.number);
+            } else {
+                const SelPoint g = Split(group, station);
+                Radical& r = g.radical == "*" ? anyRadical : radicals[g.radical.str()];
+                r.singles.emplace(g.number, g.dotted, setUp(g));
+            }
+            return true;
+        });
+        for (auto& radical : radicals) {
+            for (auto& entry : radical.second.ranges) {
+                auto& spans = entry.second;
+                std::sort(spans.begin(), spans.end());
+                size_t kept = 0;
+                for (const auto& span : spans) {
+                    if (kept > 0 && span.first <= spans[kept - 1].second + 1)
+                        spans[kept - 1].second = std::max(spans[kept - 1].second, span.second);
+                    else
+                        spans[kept++] = span;
+                }
+                spans.resize(kept);
+            }
+        }
+    }
+
+    static bool Single(const Radical& r, const SelPoint& p, int rep) {
+        return !r.singles.empty() && (r.singles.count({p.number, p.dotted, rep}) || r.singles.count({-1, p.dotted, rep}));
+    }
+
+    bool Matches(const SelPoint& p, bool station) const {
+        const int rep = station ? p.rep : 0;
+        if (Single(anyRadical, p, rep)) return true;
+        const auto found = radicals.find(p.radical.str());
+        if (found == radicals.end()) return false;
+        if (Single(found->second, p, rep)) return true;
+        const auto spans = found->second.ranges.find(rep);
+        if (spans == found->second.ranges.end()) return false;
+        const long long n = p.number;
+        const auto after = std::upper_bound(spans->second.begin(), spans->second.end(), std::make_pair(n, LLONG_MAX));
+        return after != spans->second.begin() && std::prev(after)->second >= n;
+    }
+};
+
+CSelMatcher::CSelMatcher(const CString& sel) : m_sel(sel) {}
+CSelMatcher::~CSelMatcher() = default;
+
+int CSelMatcher::Contains(const CString& np) {
+    if (m_sel.IsEmpty()) return 0;
+    const bool station = IsStationRef(np);
+    std::unique_ptr<Index>& index = station ? m_setUps : m_plain;
+    if (!index) index = std::make_unique<Index>(m_sel, station);
+    return index->Matches(Split(np, station), station) ? 1 : 0;
 }
 
 int CCarnet::GetSelStringCount(const CString& sel) {

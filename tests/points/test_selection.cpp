@@ -134,3 +134,24 @@ TEST(Selection, DialogField) {
         }
     }
 }
+
+// The matcher that reads a selection once answers as IsPointInSel does, on
+// numbers and selections drawn from a small alphabet so that they meet.
+TEST(Selection, TheMatcherAgreesWithIsPointInSel) {
+    const char* const parts[] = {"P", "P.", "A", "*", "1", "2", "7", "12", "(1)", "(2)", "-", "-", ";", ".*", ""};
+    unsigned int seed = 12345;
+    auto draw = [&seed, &parts](int most) {
+        std::string text;
+        for (int n = static_cast<int>((seed = seed * 1103515245u + 12345u) >> 16) % most; n >= 0; --n)
+            text += parts[((seed = seed * 1103515245u + 12345u) >> 16) % (sizeof parts / sizeof *parts)];
+        return text;
+    };
+    for (int s = 0; s < 400; ++s) {
+        const CString sel(draw(12));
+        CSelMatcher matcher(sel);
+        for (int n = 0; n < 40; ++n) {
+            const CString np(draw(4));
+            ASSERT_EQ(matcher.Contains(np), CCarnet::IsPointInSel(np, sel)) << np.str() << " in " << sel.str();
+        }
+    }
+}

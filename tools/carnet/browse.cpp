@@ -130,11 +130,12 @@ int Select(const std::string& path, const std::string& typed) {
     const bool setUps = selection.Find('(') >= 0;
     std::map<std::string, int> setUpsSoFar;
     ElementRows rows(book);
+    CSelMatcher matcher(selection);
     for (int i = 0; i < book.length(); ++i) {
         CString name = book.matAt(i);
         if (name.IsEmpty()) continue;
         if (setUps && book.typAt(i) == 1001) name.AppendFormat("(%d)", ++setUpsSoFar[name.str()]);
-        if (CCarnet::IsPointInSel(name, selection)) rows.Add(i);
+        if (matcher.Contains(name)) rows.Add(i);
     }
     Put(selection.str() + "\n");
     std::printf("%s named, %s of the book match\n", Plural(CCarnet::GetSelStringCount(selection), "point number").c_str(),
