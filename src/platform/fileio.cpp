@@ -170,7 +170,13 @@ int ResolveTarget(const std::string& path, bool refuseLinks, std::string& target
         if (n < 0) return Fail(errno);
         if (static_cast<size_t>(n) >= link.size()) return ENAMETOOLONG;  // changed while read
         link.resize(static_cast<size_t>(n));
-        target = link[0] == '/' ? link : folder + "/" + link;
+        if (link[0] == '/') {
+            target = link;
+        } else {
+            target = folder;
+            target += '/';
+            target += link;
+        }
     }
 }
 
