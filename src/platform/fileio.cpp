@@ -291,9 +291,11 @@ int CarnetWriteFile(const char* path, const CarnetFill& fill, const CarnetWriteO
     const std::string prefix = TemporaryPrefix(NameOf(target));
     RemoveLeftovers(folder, prefix);
     std::string temp = folder + "/" + prefix + "XXXXXX";
+    // Named as pending before it exists: mkostemp writes the name in place,
+    // so a signal that comes just after the file is made finds it.
+    const Pending pending(temp.c_str());
     const int fd = ::mkostemp(&temp[0], O_CLOEXEC);
     if (fd < 0) return Fail(errno);
-    const Pending pending(temp.c_str());
     // Held until the file is closed: a later save sees that it is alive.
     ::flock(fd, LOCK_EX | LOCK_NB);
 
