@@ -1,7 +1,9 @@
 // The benchmark program. Started as `carnet_bench --measure-load FILE` it is
 // the child of the memory benchmark instead: it loads the file and prints
 // its resident size before the load, its peak and its size after it (KiB),
-// and the number of elements loaded. `carnet_bench --write-book N FILE`
+// and the number of elements loaded. `carnet_bench --run-child PROGRAM ...`
+// runs a program for the process benchmarks (bench_tool.cpp).
+// `carnet_bench --write-book N FILE`
 // writes the generated book of N elements, for a profiler to load.
 #include <benchmark/benchmark.h>
 
@@ -55,6 +57,7 @@ std::string bench::SelfPath() {
 
 int main(int argc, char** argv) {
     if (argc == 3 && std::strcmp(argv[1], "--measure-load") == 0) return MeasureLoad(argv[2]);
+    if (argc >= 3 && std::strcmp(argv[1], "--run-child") == 0) return bench::RunChild(argv + 2);
     if (argc == 4 && std::strcmp(argv[1], "--write-book") == 0) {
         CCarnet book;
         bench::GenerateBook(book, std::atoi(argv[2]));

@@ -33,6 +33,10 @@ MEMORY_GOAL = 3.0
 PER_CALL = ("BM_IsPointInSel", "BM_FormMatNormalise", "BM_FormMatBuild", "BM_InitCode", "BM_Interprete",
             "BM_FindRepAtEveryStation")
 
+# carnet check against the plain C loop, whole processes (median of 5 runs).
+TOOL_GOAL = 1.3
+TOOL_MEMORY_GOAL = 2.0
+
 # The selection matcher: its cost must grow with the logarithm of the number
 # of groups, not with the number (cpu time, from 10 groups to each count).
 SELECT_GROUPS = (10, 100, 1000)
@@ -49,7 +53,7 @@ def load(path):
     for b in data.get("benchmarks", []):
         name = b.get("run_name", b["name"])
         # A name like BM_LoadMemory/10000/iterations:1 is keyed without its options.
-        key = "/".join(p for p in name.split("/") if ":" not in p)
+        key = "/".join(p for p in name.split("/") if ":" not in p and p not in ("manual_time", "real_time"))
         if b.get("run_type") == "aggregate":
             if b.get("aggregate_name") == "median":
                 medians[key] = b
@@ -168,6 +172,18 @@ def main(argv):
         table.add(size, f"{run.get('file_bytes', 0) / 1e6:.1f}", fmt(run.get("peak_bytes_per_element"), 0),
                   fmt(peak), status(peak, MEMORY_GOAL), f"<= {MEMORY_GOAL}")
     table.show(("elements", "file MB", "peak bytes/element", "peak / file", "", "goal"))
+
+    print("carnet check of the 1-million-element book against the C getline + split + strtod loop (whole processes)")
+    tool, loop = runs.get("BM_ToolCheck"), runs.get("BM_CLoopCheck")
+    if tool and loop:
+        wall = ns(tool, "real") / ns(loop, "real")
+        cpu = tool.get("child_cpu_s", 0) / loop["child_cpu_s"] if loop.get("child_cpu_s") else None
+        peak = tool.get("peak_over_file")
+        table.add("carnet check / C loop", fmt(ns(tool, "real") / 1e6, 0), fmt(ns(loop, "real") / 1e6, 0), fmt(wall),
+                  status(wall, TOOL_GOAL), fmt(cpu), status(cpu, TOOL_GOAL), f"<= {TOOL_GOAL}")
+        table.add("peak memory of carnet check / file", "", "", fmt(peak), status(peak, TOOL_MEMORY_GOAL), "", "",
+                  f"<= {TOOL_MEMORY_GOAL}")
+    table.show(("measure", "tool ms", "loop ms", "wall", "", "cpu", "", "goal"))
 
     print("Selection matched against every element of the 100 000-element book (ms)")
     few = runs.get(f"BM_SelectMatcher/{SELECT_GROUPS[0]}")

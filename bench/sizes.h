@@ -16,4 +16,8 @@ inline void BookSizes(benchmark::internal::Benchmark* b) {
 // The path of this program, to start it again as a measuring child.
 std::string SelfPath();
 
+// Runs argv[0] with its arguments, its output thrown away, and prints its
+// wall-clock and CPU seconds and its peak resident bytes; 1 when it failed.
+int RunChild(char** argv);
+
 }  // namespace bench

@@ -118,7 +118,9 @@ void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int&
         }
         return nullptr;
     }
-    ReadContext ctx(book, wnd, line, index, bAppend);
+    // One cut for every line read, so that its words keep their room.
+    static LineCut cut;
+    ReadContext ctx(book, wnd, line, index, bAppend, cut);
     if (!CutLine(line, ctx.cut)) {
         if (wnd) {
             wnd->Printf(1, carnet_texts::kNoCommand, index + 1);

@@ -35,15 +35,15 @@ bool CutLine(std::string_view line, LineCut& cut);
 // Everything a branch of the reader needs to build, store and report.
 class ReadContext {
 public:
-    ReadContext(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend)
-        : book(book), wnd(wnd), line(line), index(index), bAppend(bAppend) {}
+    ReadContext(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend, LineCut& cut)
+        : book(book), wnd(wnd), line(line), index(index), bAppend(bAppend), cut(cut) {}
 
     CCarnet& book;
     CNorvexTxtWnd* wnd;
     std::string_view line;  // as passed in, shown after every message
     int& index;
     int bAppend;
-    LineCut cut;
+    LineCut& cut;
 
     size_t WordCount() const { return cut.Words().size(); }
     std::string_view WordAt(size_t i) const { return cut.Words()[i]; }

@@ -6,6 +6,7 @@
 #include <sys/stat.h>
 #include <sys/types.h>
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdio>
 #include <functional>
@@ -49,6 +50,10 @@ public:
     int Read(const char* path);
     // The bytes read; valid until the next Read or the destruction.
     std::string_view View() const { return std::string_view(m_data, m_size); }
+    // The bytes, for a caller that rewrites them in place (a conversion that
+    // never lengthens them) and then keeps only the first `size` (Shrink).
+    char* Data() { return m_data; }
+    void Shrink(size_t size) { m_size = std::min(m_size, size); }
     // The state of the file read (unknown for what is not a regular file).
     const CarnetFileState& State() const { return m_state; }
     // The bytes before `offset` are no longer needed: their memory is given

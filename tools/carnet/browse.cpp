@@ -24,7 +24,7 @@ void Put(const std::string& cp1252) {
 // A book loaded for reading: the rows can be shown even when some lines were
 // rejected, and the status then says so.
 struct Loaded {
-    CCarnet book;
+    CCarnet& book = FreshBook();
     int status = kOk;
 
     explicit Loaded(const std::string& path) {
@@ -43,7 +43,7 @@ std::string Coordinate(const char* label, double v) {
 int Check(const std::vector<std::string>& files) {
     int status = kOk;
     for (const std::string& path : files) {
-        CCarnet book;
+        CCarnet& book = FreshBook();
         int rejected = 0;
         const int result = LoadBook(path, book, rejected);
         status = std::max(status, result);

@@ -109,7 +109,7 @@ unsigned int DrawingType(const std::string& keyword) {
 }  // namespace
 
 int Format(const std::string& path, const std::string& output, bool backup, const std::string& params) {
-    CCarnet book;
+    CCarnet& book = FreshBook();
     int rejected = 0;
     const int status = LoadBook(path, book, rejected, true);
     if (status != kOk) return status;

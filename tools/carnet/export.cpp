@@ -162,7 +162,7 @@ bool WriteGeoJson(const Survey& survey, std::FILE* f) {
 }
 
 int Export(const std::string& path, const std::string& format, const std::string& output) {
-    CCarnet book;
+    CCarnet& book = FreshBook();
     int rejected = 0;
     const int status = LoadBook(path, book, rejected, true);
     if (status != kOk && (status != kRejected || rejected == 0)) return status;

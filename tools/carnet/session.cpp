@@ -45,6 +45,13 @@ Session& CurrentSession() {
     return session;
 }
 
+CCarnet& FreshBook() {
+    Session& session = CurrentSession();
+    delete session.book;
+    session.book = new CCarnet;
+    return *session.book;
+}
+
 bool FlushOutput() {
     int& error = CurrentSession().outputError;
     errno = 0;
@@ -66,8 +73,6 @@ std::string Plural(long n, const char* word) {
 }
 
 int ReadInput(const std::string& path, Input& input) {
-    input.m_converted = false;
-    input.m_text.clear();
     if (const int err = input.m_file.Read(path.c_str())) {
         Say(path, std::string("cannot read: ") +
                       (err == EFBIG ? "not a regular file, and longer than 256 MiB" : std::strerror(err)));
@@ -86,15 +91,14 @@ int ReadInput(const std::string& path, Input& input) {
     }
     if (kind != TextKind::Utf8) return kOk;
     // A byte order mark says UTF-8 and is no part of the text.
-    std::string_view text = bytes;
-    if (text.compare(0, 3, "\xEF\xBB\xBF") == 0) text.remove_prefix(3);
+    const size_t start = bytes.compare(0, 3, "\xEF\xBB\xBF") == 0 ? 3 : 0;
+    size_t size = bytes.size();
     Unheld unheld;
-    if (!Cp1252Of(text, input.m_text, unheld)) {
-        SayUnheld(path + ":" + std::to_string(LineOf(bytes, unheld.offset + (bytes.size() - text.size()))),
-                  "stopped, nothing written: ", unheld);
+    if (!Cp1252InPlace(input.m_file.Data(), start, size, unheld)) {
+        SayUnheld(path + ":" + std::to_string(unheld.line), "stopped, nothing written: ", unheld);
         return kRejected;
     }
-    input.m_converted = true;
+    input.m_file.Shrink(size);
     return kOk;
 }
 

@@ -151,24 +151,52 @@ std::string Utf8Of(std::string_view cp1252) {
     return out;
 }
 
-bool Cp1252Of(std::string_view utf8, std::string& out, Unheld& unheld) {
-    out.clear();
-    if (!HasHighBytes(utf8)) {
-        out.assign(utf8);
-        return true;
+bool Cp1252InPlace(char* text, size_t start, size_t& size, Unheld& unheld) {
+    // Runs of ASCII move as they are; each run of other characters goes
+    // through iconv. Code page 1252 never takes more bytes than UTF-8, so
+    // what is written never passes what is still to be read.
+    size_t from = start, to = 0;
+    std::string converted;
+    while (from < size) {
+        size_t ascii = from;
+        while (ascii + 8 <= size && !AnyHigh8(text + ascii)) ascii += 8;
+        while (ascii < size && static_cast<unsigned char>(text[ascii]) < 0x80) ++ascii;
+        std::memmove(text + to, text + from, ascii - from);
+        to += ascii - from;
+        from = ascii;
+        size_t end = from;
+        while (end < size && static_cast<unsigned char>(text[end]) >= 0x80) ++end;
+        if (end == from) break;
+        converted.clear();
+        int error = 0;
+        const size_t used = ToCp1252().Run(std::string_view(text + from, end - from), converted, error);
+        if (error != 0) {
+            const std::string_view rest(text + from + used, end - from - used);
+            const size_t n = std::max<size_t>(1, SequenceLength(static_cast<unsigned char>(rest[0])));
+            unheld.character.assign(rest.substr(0, n));
+            const unsigned char lead = static_cast<unsigned char>(unheld.character[0]);
+            unsigned long cp = n == 1 ? lead : lead & (0x7F >> n);
+            for (size_t k = 1; k < unheld.character.size(); ++k)
+                cp = (cp << 6) | (static_cast<unsigned char>(unheld.character[k]) & 0x3F);
+            unheld.codePoint = cp;
+            // The lines before it have all been moved, newlines included.
+            unheld.line = 1 + std::count(text, text + to, '\n');
+            return false;
+        }
+        std::memcpy(text + to, converted.data(), converted.size());
+        to += converted.size();
+        from = end;
     }
-    int error = 0;
-    const size_t used = ToCp1252().Run(utf8, out, error);
-    if (error == 0) return true;
-    unheld.offset = used;
-    const size_t n = std::max<size_t>(1, SequenceLength(static_cast<unsigned char>(utf8[used])));
-    unheld.character.assign(utf8.substr(used, n));
-    const unsigned char lead = static_cast<unsigned char>(unheld.character[0]);
-    unsigned long cp = n == 1 ? lead : lead & (0x7F >> n);
-    for (size_t k = 1; k < unheld.character.size(); ++k)
-        cp = (cp << 6) | (static_cast<unsigned char>(unheld.character[k]) & 0x3F);
-    unheld.codePoint = cp;
-    return false;
+    size = to;
+    return true;
+}
+
+bool Cp1252Of(std::string_view utf8, std::string& out, Unheld& unheld) {
+    out.assign(utf8);
+    size_t size = out.size();
+    if (!Cp1252InPlace(&out[0], 0, size, unheld)) return false;
+    out.resize(size);
+    return true;
 }
 
 std::string ForOutput(std::string_view text, Encoding encoding) {

@@ -34,7 +34,7 @@ bool HasHighBytes(std::string_view text);
 
 // A character that code page 1252 cannot hold, met while converting.
 struct Unheld {
-    size_t offset = 0;      // in the UTF-8 text
+    long line = 0;          // of the UTF-8 text, counted from 1
     std::string character;  // its UTF-8 bytes
     unsigned long codePoint = 0;
 };
@@ -42,6 +42,9 @@ struct Unheld {
 // UTF-8 text as code page 1252; false, with the character, when one has no
 // place in code page 1252. The text must be valid UTF-8.
 bool Cp1252Of(std::string_view utf8, std::string& out, Unheld& unheld);
+// The same in place: the text's bytes from `start` to `size` become their
+// code page 1252 form at its beginning, and `size` its length.
+bool Cp1252InPlace(char* text, size_t start, size_t& size, Unheld& unheld);
 
 // The text in the chosen output encoding.
 std::string ForOutput(std::string_view text, Encoding encoding);
