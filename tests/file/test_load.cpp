@@ -261,11 +261,25 @@ TEST(Load, WorkedExampleAndLineNumbers) {
     EXPECT_EQ(t[2].substr(0, 16), "Erreur ligne 1 :");
     EXPECT_EQ(t[4], "Erreur ligne 7 : commande <Mauvais> incorrecte !");
 
+    const std::vector<std::string> first = t;
+
     // The same file appended to a book of 6: messages start at line 7.
     wnd.Clear();
     EXPECT_EQ(book.Load(&wnd, path.c_str(), 1, nullptr), 1);
     EXPECT_EQ(book.length(), 12);
     EXPECT_EQ(wnd.Texts()[0].substr(0, 16), "Erreur ligne 7 :");
+
+    // The same bytes held in memory load the same, the book's file name kept.
+    std::FILE* f = std::fopen(path.c_str(), "rb");
+    std::string bytes(4096, '\0');
+    bytes.resize(std::fread(&bytes[0], 1, bytes.size(), f));
+    std::fclose(f);
+    CCarnet again;
+    CNorvexTxtWnd againWnd;
+    EXPECT_EQ(again.LoadBytes(&againWnd, bytes, "", 0), 1);
+    EXPECT_EQ(again.m_FileName, "Sitebook.geo");
+    EXPECT_EQ(againWnd.Texts(), first);
+    for (int i = 0; i < 6; ++i) EXPECT_EQ(again.parAt(i), book.parAt(i));
 }
 
 TEST(Load, SavedLinesLoadBackAsWritten) {
