@@ -239,8 +239,6 @@ int CarnetFileBytes::Read(const char* path) {
             }
             m_data = static_cast<char*>(p);
             m_mapped = bigger;
-            // Large pages where the system offers them: fewer faults to fill.
-            ::madvise(m_data, m_mapped, MADV_HUGEPAGE);
         }
         const ssize_t n = ::read(fd, m_data + m_size, std::min(m_mapped, wanted) - m_size);
         if (n == 0) break;
