@@ -1,7 +1,7 @@
 # Entry points: `make run` builds the tool and runs it on the bundled example;
 # `make test` builds and runs every test, plainly and under the sanitizers.
 JOBS ?= $(shell nproc)
-DEB_PACKAGES := cmake ninja-build g++ clang libgtest-dev libgmock-dev libcli11-dev libbenchmark-dev locales python3 libdxflib-dev python3-ezdxf
+DEB_PACKAGES := cmake ninja-build g++ clang libgtest-dev libgmock-dev libcli11-dev libbenchmark-dev locales python3 libdxflib-dev python3-ezdxf libproj-dev proj-data proj-bin libeigen3-dev gdal-bin gcovr
 
 .PHONY: all deps build run test test-release test-asan bench fuzz lint clean
 
