@@ -3,7 +3,7 @@
 JOBS ?= $(shell nproc)
 DEB_PACKAGES := cmake ninja-build g++ clang libgtest-dev libgmock-dev libcli11-dev libbenchmark-dev locales python3 libdxflib-dev python3-ezdxf libproj-dev proj-data proj-bin libeigen3-dev gdal-bin gcovr
 
-.PHONY: all deps build run test test-release test-asan bench fuzz lint clean
+.PHONY: all deps build run test test-release test-asan coverage bench fuzz lint clean
 
 all: build
 
@@ -38,6 +38,20 @@ test-asan: deps
 	cmake --preset asan >/dev/null
 	cmake --build --preset asan -j $(JOBS)
 	ctest --preset asan -j $(JOBS)
+
+# Line and branch coverage of the library (all of src/) by the whole test
+# suite, the tool's tests and the corpus replays included: counters start
+# from zero, the table of lines per file goes to build/coverage/coverage.txt, the sums
+# are printed. Branches that only throw or that the compiler made unreachable
+# are not counted.
+coverage: deps
+	cmake --preset coverage >/dev/null
+	cmake --build --preset coverage -j $(JOBS)
+	find build/coverage -name '*.gcda' -delete
+	ctest --preset coverage -j $(JOBS) >build/coverage/ctest.log || { tail -n 30 build/coverage/ctest.log; exit 1; }
+	gcovr --root . --filter 'src/' --exclude-throw-branches --exclude-unreachable-branches \
+	  --gcov-exclude '.*CompilerId.*' --object-directory build/coverage --txt build/coverage/coverage.txt \
+	  --print-summary build/coverage | tail -n 3
 
 # Benchmarks against the cost of merely reading and writing the same bytes,
 # then their ratios; never part of `make test`.

@@ -1,5 +1,6 @@
 # Installs the library into a scratch prefix, then configures, builds and runs
-# the consumer project against it.
+# the consumer project against it, linked as the library was built (the
+# coverage build's objects need the coverage runtime).
 file(REMOVE_RECURSE ${WORK_DIR})
 execute_process(COMMAND ${CMAKE_COMMAND} --install ${BINARY_DIR} --prefix ${WORK_DIR}/prefix
                 RESULT_VARIABLE rc OUTPUT_QUIET)
@@ -13,6 +14,7 @@ foreach(f include/carnet/carnet.h lib/pkgconfig/carnet.pc lib/cmake/carnet/carne
 endforeach()
 execute_process(COMMAND ${CMAKE_COMMAND} -S ${SOURCE_DIR}/tests/consumer -B ${WORK_DIR}/build -G Ninja
                 -DCMAKE_CXX_COMPILER=${CXX} -DCMAKE_PREFIX_PATH=${WORK_DIR}/prefix -DSANITIZE=${SANITIZE}
+                "-DCMAKE_EXE_LINKER_FLAGS=${LINK_FLAGS}"
                 RESULT_VARIABLE rc)
 if(NOT rc EQUAL 0)
   message(FATAL_ERROR "consumer configure failed: ${rc}")
