@@ -113,8 +113,9 @@ public:
     CCode(const CCode&) = default;
     ~CCode() = default;
 
-    // Both copy every member; a null pointer or the entry itself changes nothing.
-    void operator=(const CCode& other);
+    // Both copy every member (the compiler's member-wise copy, so that a new
+    // member cannot be forgotten); a null pointer changes nothing.
+    CCode& operator=(const CCode& other) = default;
     void operator=(const CCode* other);
 
     // Parses one table line of format `version`; false only for a null or

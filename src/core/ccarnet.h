@@ -100,7 +100,7 @@ public:
     double findER(int i, int lower) const;
     double findET(int i, int lower) const;
     double findEV(int i, int lower) const;
-    // The first point (type 1006) of a number, or of the element's number.
+    // The first point (a CPointGen) of a number, or of the element's number.
     int hasPnt(const CString& np) const;
     int hasPnt(int i) const;
     int hasPnt(const CString& np, double& x, double& y, double& z) const;

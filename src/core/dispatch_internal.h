@@ -3,9 +3,48 @@
 #pragma once
 
 #include <cstdio>
+#include <type_traits>
+#include <utility>
 
 #include <carnet/cstring.h>
+#include <carnet/element_types.h>
 #include <carnet/txtwnd.h>
+
+// What an element class offers, read from its members: the operations below
+// are built from these, and so are the typed lookups (find.cpp).
+namespace carnet_traits {
+
+template <class T, class = void>
+struct HasParams : std::false_type {};
+template <class T>
+struct HasParams<T, std::void_t<decltype(std::declval<T&>().Params(std::declval<CString&>()))>> : std::true_type {};
+
+// A point number, read in place.
+template <class T, class = void>
+struct HasNp : std::false_type {};
+template <class T>
+struct HasNp<T, std::void_t<decltype(static_cast<const CString&>(std::declval<const T&>().Np()))>> : std::true_type {};
+
+// A code (symbol), read in place.
+template <class T, class = void>
+struct HasSy : std::false_type {};
+template <class T>
+struct HasSy<T, std::void_t<decltype(static_cast<const CString&>(std::declval<const T&>().Sy()))>> : std::true_type {};
+
+// A keyword that depends on the record (the table gives the others).
+template <class T, class = void>
+struct HasFileKeyword : std::false_type {};
+template <class T>
+struct HasFileKeyword<T, std::void_t<decltype(std::declval<const T&>().FileKeyword())>> : std::true_type {};
+
+// A file text of one line (a traverse path has several).
+template <class T, class = void>
+struct HasLineInfos : std::false_type {};
+template <class T>
+struct HasLineInfos<T, std::void_t<decltype(std::declval<T&>().Infos(std::declval<CString&>()))>>
+    : std::true_type {};
+
+}  // namespace carnet_traits
 
 struct ElementOps {
     void (*destroy)(void* p);
@@ -20,8 +59,7 @@ struct ElementOps {
     void (*infos)(void* p, CString& out);      // null: no one-line file text
 };
 
-// The operations of a type code, or null for a code outside the table or a
-// class that is not part of the build.
+// The operations of a type code, or null for a code outside the table.
 const ElementOps* ElementOpsFor(unsigned int code);
 
 // Frees an element as its type code says: its destructor runs when the code

@@ -1,12 +1,16 @@
 // The one table of element types: type code, class and the keyword(s) that
 // open the element's line in the field-book file. Everything that depends on
-// the type of an element (dispatch, reading, cmdAt) is built from it.
+// the type of an element (dispatch, reading, lookups, cmdAt) is built from
+// it; no other file spells a type code.
 #pragma once
 
+#include <type_traits>
+
 // X(code, class, keyword[, more keywords]) for the 66 element types, in code
-// order. Accented keywords are code-page-1252 bytes; a literal is split after
-// each \xNN escape so that the next letter is not read as a hex digit.
-#define CARNET_ELEMENT_TYPES(X)                                               \
+// order: the survey records, then the drawing commands. Accented keywords are
+// code-page-1252 bytes; a literal is split after each \xNN escape so that the
+// next letter is not read as a hex digit.
+#define CARNET_RECORD_TYPES(X)                                                \
     X(1000, CComment, "Commentaire")                                          \
     X(1001, CStation, "Station")                                              \
     X(1002, CReference, "Reference")                                          \
@@ -17,7 +21,9 @@
     X(1007, CChemin, "CheminAntenne", "CheminEncadre", "Cheminement")         \
     X(1008, CAppareil, "Appareil")                                            \
     X(1009, CCommand, "Commande")                                             \
-    X(1010, CExcent, "ExcentRad", "ExcentTan", "ExcentVer")                   \
+    X(1010, CExcent, "ExcentRad", "ExcentTan", "ExcentVer")
+
+#define CARNET_DRAWING_TYPES(X)                                               \
     X(1011, CPointSansOri, "PT_Sans_Ori")                                     \
     X(1012, CPointAvecOri, "PT_Avec_Ori")                                     \
     X(1013, COrientationPT, "D\xE9" "f_Ori_PT")                               \
@@ -74,13 +80,36 @@
     X(1064, CSymetric, "Sym\xE9" "trique")                                    \
     X(1065, CInterDist, "Inter_Dist")
 
+#define CARNET_ELEMENT_TYPES(X) CARNET_RECORD_TYPES(X) CARNET_DRAWING_TYPES(X)
+
 #define CARNET_DECLARE_ELEMENT_CLASS(code, cls, ...) class cls;
 CARNET_ELEMENT_TYPES(CARNET_DECLARE_ELEMENT_CLASS)
 #undef CARNET_DECLARE_ELEMENT_CLASS
 
-constexpr unsigned int CARNET_FIRST_TYPE = 1000;
-constexpr unsigned int CARNET_LAST_TYPE = 1065;
-constexpr unsigned int CARNET_FIRST_DRAWING_TYPE = 1011;
+// The type code of an element class: TypeCode<CPointGen>::value.
+template <class T>
+struct TypeCode;
+#define CARNET_TYPE_CODE(code, cls, ...) \
+    template <>                          \
+    struct TypeCode<cls> : std::integral_constant<unsigned int, code> {};
+CARNET_ELEMENT_TYPES(CARNET_TYPE_CODE)
+#undef CARNET_TYPE_CODE
+
+// Whether an element class is a drawing command (the second part of the table).
+template <class T>
+struct IsDrawingCommand : std::false_type {};
+#define CARNET_IS_DRAWING(code, cls, ...) \
+    template <>                           \
+    struct IsDrawingCommand<cls> : std::true_type {};
+CARNET_DRAWING_TYPES(CARNET_IS_DRAWING)
+#undef CARNET_IS_DRAWING
+
+// The bounds of the table, in code order.
+constexpr unsigned int CARNET_FIRST_TYPE = TypeCode<CComment>::value;
+constexpr unsigned int CARNET_LAST_TYPE = TypeCode<CInterDist>::value;
+constexpr unsigned int CARNET_FIRST_DRAWING_TYPE = TypeCode<CPointSansOri>::value;
+// Not a type: asks lastMat and nextMat for the elements of every type.
+constexpr unsigned int CARNET_ANY_TYPE = 999;
 
 // One row of the table.
 struct CarnetElementType {

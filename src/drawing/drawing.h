@@ -1,4 +1,4 @@
-// The drawing commands, element types 1011 to 1065: one class per kind, each
+// The drawing commands of the type table: one class per kind, each
 // over the template of its member layout (drawing_layouts.h) with its own
 // display labels and rules as template arguments. The type code and keyword
 // of each class come from the type table.

@@ -1,6 +1,6 @@
-// The ten member layouts of the drawing commands (element types 1011 to
-// 1065). Every command class is a thin named class over one of the templates
-// below; what tells the classes of a layout apart (labels of the display
+// The ten member layouts of the drawing commands (the second part of the
+// type table). Every command class is a thin named class over one of the
+// templates below; what tells the classes of a layout apart (labels of the display
 // text, which fields the file line leaves out, the setVal tolerance, which
 // value constructors exist) is given as template arguments where the class is
 // declared, in drawing.h.
@@ -21,16 +21,7 @@
 
 namespace carnet_drawing {
 
-// The type code of an element class, read from the one type table.
-template <class T>
-struct TypeCode;
-#define CARNET_DRAWING_TYPE_CODE(code, cls, ...)     \
-    template <>                                      \
-    struct TypeCode<cls> {                           \
-        static constexpr unsigned int value = code;  \
-    };
-CARNET_ELEMENT_TYPES(CARNET_DRAWING_TYPE_CODE)
-#undef CARNET_DRAWING_TYPE_CODE
+using ::TypeCode;
 
 // The labels of the display texts; their wording lives in drawing_layouts.cpp.
 enum Label : unsigned char {
@@ -155,7 +146,7 @@ using Takes = std::enable_if_t<(args >= MinArgs), int>;
 // Print and Write, shared by every layout: both send the class's Infos line.
 template <class Self>
 class CommandOutput {
-    static_assert(TypeCode<Self>::value >= CARNET_FIRST_DRAWING_TYPE, "a drawing command of the type table");
+    static_assert(IsDrawingCommand<Self>::value, "a drawing command of the type table");
 
 public:
     void Print(CNorvexTxtWnd* wnd, int n) const {

@@ -1,7 +1,6 @@
-// The drawing-command branch of the line reader (types 1011 to 1065): the
-// number of fields each keyword accepts, and the fields given to the
-// command's members in their order.
-#include <cassert>
+// The drawing-command readers of the line reader: the number of fields each
+// keyword accepts, and the fields given to the command's members in their
+// order.
 #include <string>
 
 #include <carnet/drawing.h>
@@ -31,66 +30,81 @@ constexpr FieldRule kUpTo4{1, 4, false, false};
 // Segment constructions without their number mean nothing: dropped quietly.
 constexpr FieldRule kNeeds2Quiet{2, 3, true, false};
 
-// In type order, from 1011.
-constexpr FieldRule kRules[] = {
-    kAtLeast1,                    // 1011 PT_Sans_Ori
-    kAtLeast1,                    // 1012 PT_Avec_Ori
-    kAtLeast1,                    // 1013 Def_Ori_PT
-    kAtLeast1,                    // 1014 Annul_Ori_PT
-    kAtLeast1,                    // 1015 Def_Ori_SY
-    kAtLeast1,                    // 1016 Annul_Ori_SY
-    kUpTo3,                       // 1017 Sym_sans_Ori
-    kUpTo2,                       // 1018 Sym_Cir_Ray
-    kUpTo2,                       // 1019 Sym_Cir_Dia
-    kAtLeast1,                    // 1020 Sym_Cir_3Pt
-    kUpTo3,                       // 1021 Sym_Oriente
-    kUpTo2,                       // 1022 Sym_Ori_EX
-    kAtLeast1,                    // 1023 Sym_Car_Dia
-    kAtLeast1,                    // 1024 Sym_Fixe_2Pt
-    kUpTo2,                       // 1025 Sym_2Pts
-    kUpTo2,                       // 1026 Sym_2Pt_EX
-    kUpTo2,                       // 1027 Sym_2Pt_EY
-    kUpTo3,                       // 1028 Sym_3Pts_H
-    kUpTo3,                       // 1029 Sym_3Pts_D
-    kUpTo2,                       // 1030 Sym_Comp_1
-    kUpTo2,                       // 1031 Sym_Comp_2
-    kUpTo3,                       // 1032 Sym_Comp_3
-    kUpTo4,                       // 1033 Sym_Entree
-    {2, 2, false, false},         // 1034 Sym_Aligne: the count is required
-    kUpTo3,                       // 1035 Cercle_R
-    kUpTo3,                       // 1036 Cercle_D
-    {1, 2, false, true},          // 1037 Cercle_3Pts
-    {1, 2, false, true},          // 1038 Carre_Dia
-    kUpTo3,                       // 1039 Carre_2Pts
-    kUpTo4,                       // 1040 Rect_3Pts_H
-    kUpTo4,                       // 1041 Rect_3Pts_D
-    kUpTo2,                       // 1042 Liaison
-    kNeeds2Quiet,                 // 1043 Perp_Segment
-    kUpTo2,                       // 1044 Alignement
-    kNeeds2Quiet,                 // 1045 Prol_Segment
-    kUpTo3,                       // 1046 Inter_Segment
-    kNeeds2Quiet,                 // 1047 Parallele
-    kUpTo2,                       // 1048 Escalier_1
-    kUpTo3,                       // 1049 Escalier_2
-    kUpTo2,                       // 1050 Escalier_3
-    kUpTo4,                       // 1051 Escalier_4
-    kUpTo2,                       // 1052 Escalier_5
-    {1, 1, false, false},         // 1053 Passage_Pieton
-    {1, 1, false, false},         // 1054 Passage_Velo
-    kAtLeast1,                    // 1055 Texte_1Pt (free text)
-    kAtLeast1,                    // 1056 Texte_Oriente (free text)
-    kAtLeast1,                    // 1057 Cache_Attrib
-    kAtLeast1,                    // 1058 Ajout_Attrib (free text)
-    kAtLeast1,                    // 1059 Attrib_Point (free text)
-    kAtLeast1,                    // 1060 Accro_Pt_Pro
-    {2, kNoLimit, false, false},  // 1061 Accro_Li_Pro
-    {2, kNoLimit, false, false},  // 1062 Rappel_Point
-    kAtLeast1,                    // 1063 Perp_2Pts
-    kAtLeast1,                    // 1064 Symetrique
-    {3, kNoLimit, false, false},  // 1065 Inter_Dist
+// The rule of each drawing command, in the order of the type table (checked
+// below, so that a row cannot stand for another command).
+struct RuleRow {
+    unsigned int code;
+    FieldRule rule;
 };
-static_assert(sizeof kRules / sizeof kRules[0] == CARNET_LAST_TYPE - CARNET_FIRST_DRAWING_TYPE + 1,
-              "one rule per drawing command");
+template <class T>
+constexpr RuleRow Rule(FieldRule rule) {
+    return {TypeCode<T>::value, rule};
+}
+constexpr RuleRow kRules[] = {
+    Rule<CPointSansOri>(kAtLeast1),
+    Rule<CPointAvecOri>(kAtLeast1),
+    Rule<COrientationPT>(kAtLeast1),
+    Rule<CRAZOrientPT>(kAtLeast1),
+    Rule<COrientationSy>(kAtLeast1),
+    Rule<CRAZOrientSy>(kAtLeast1),
+    Rule<CSymSansOri>(kUpTo3),
+    Rule<CSymCirCenRay>(kUpTo2),
+    Rule<CSymCirCenDia>(kUpTo2),
+    Rule<CSymCir3Pt>(kAtLeast1),
+    Rule<CSymAvecOri>(kUpTo3),
+    Rule<CSymOria1>(kUpTo2),
+    Rule<CSymCarDia>(kAtLeast1),
+    Rule<CSym2Pt11>(kAtLeast1),
+    Rule<CSym2Pt>(kUpTo2),
+    Rule<CSym2PtD1>(kUpTo2),
+    Rule<CSym2PtD2>(kUpTo2),
+    Rule<CSym3Pth>(kUpTo3),
+    Rule<CSym3PtD>(kUpTo3),
+    Rule<CSymComp1>(kUpTo2),
+    Rule<CSymComp2>(kUpTo2),
+    Rule<CSymComp3>(kUpTo3),
+    Rule<CSymEntree>(kUpTo4),
+    Rule<CSymAligne>({2, 2, false, false}),  // the count is required
+    Rule<CCer1PtR>(kUpTo3),
+    Rule<CCer1PtD>(kUpTo3),
+    Rule<CCer3Pt>({1, 2, false, true}),
+    Rule<CCarreDia>({1, 2, false, true}),
+    Rule<CCarre2Pt>(kUpTo3),
+    Rule<CRec3Pth>(kUpTo4),
+    Rule<CRec3PtD>(kUpTo4),
+    Rule<CLiaison>(kUpTo2),
+    Rule<CPerpenSegm>(kNeeds2Quiet),
+    Rule<CAlignement>(kUpTo2),
+    Rule<CProlonSegm>(kNeeds2Quiet),
+    Rule<CIntersSegm>(kUpTo3),
+    Rule<CParallele>(kNeeds2Quiet),
+    Rule<CEscalier1>(kUpTo2),
+    Rule<CEscalier2>(kUpTo3),
+    Rule<CEscalier3>(kUpTo2),
+    Rule<CEscalier4>(kUpTo4),
+    Rule<CEscalier5>(kUpTo2),
+    Rule<CPassagePieton>({1, 1, false, false}),
+    Rule<CPassageVelo>({1, 1, false, false}),
+    Rule<CTexte>(kAtLeast1),                // free text
+    Rule<CTexteOrient>(kAtLeast1),          // free text
+    Rule<CCacheAtt>(kAtLeast1),
+    Rule<CAddAttSy>(kAtLeast1),             // free text
+    Rule<CAddAttPt>(kAtLeast1),             // free text
+    Rule<CAccrProPt>(kAtLeast1),
+    Rule<CAccrProLi>({2, kNoLimit, false, false}),
+    Rule<CRappelPoint>({2, kNoLimit, false, false}),
+    Rule<CPerpen2Pts>(kAtLeast1),
+    Rule<CSymetric>(kAtLeast1),
+    Rule<CInterDist>({3, kNoLimit, false, false}),
+};
+
+constexpr bool RulesInTableOrder() {
+    unsigned int code = CARNET_FIRST_DRAWING_TYPE;
+    for (const RuleRow& row : kRules)
+        if (row.code != code++) return false;
+    return code == CARNET_LAST_TYPE + 1;
+}
+static_assert(RulesInTableOrder(), "one rule per drawing command, in table order");
 
 // The fields of a line; a field the line does not have reads as the member's
 // absent value.
@@ -175,39 +189,25 @@ void Fill(TextCountValueCommand<S, LN, LV, O>& c, const Fields& f) {
     c.m_Val1 = f.Number(3);
 }
 
-template <unsigned int kCode, class T>
-void* Make(const Fields& f) {
-    if constexpr (kCode >= CARNET_FIRST_DRAWING_TYPE) {
-        T* command = new T;
-        Fill(*command, f);
-        return command;
-    } else {
-        (void)f;
-        return nullptr;
-    }
-}
-
-void* MakeCommand(unsigned int code, const Fields& f) {
-    switch (code) {
-#define CARNET_MAKE_COMMAND(type, cls, ...) \
-    case type: return Make<type, cls>(f);
-        CARNET_ELEMENT_TYPES(CARNET_MAKE_COMMAND)
-#undef CARNET_MAKE_COMMAND
-        default: return nullptr;
-    }
-}
-
-}  // namespace
-
-void* ReadDrawingLine(ReadContext& ctx, unsigned int code) {
-    assert(code >= CARNET_FIRST_DRAWING_TYPE && code <= CARNET_LAST_TYPE);
-    const FieldRule& rule = kRules[code - CARNET_FIRST_DRAWING_TYPE];
+// A command of class T: the fields its keyword accepts, then its members.
+template <class T>
+void* ReadCommand(ReadContext& ctx) {
+    constexpr unsigned int code = TypeCode<T>::value;
+    const FieldRule& rule = kRules[code - CARNET_FIRST_DRAWING_TYPE].rule;
     const size_t n = ctx.WordCount();
     if (n == 0) return ctx.Incomplete();
     if (n < rule.fewest) return rule.quietWhenFewer ? nullptr : ctx.Incomplete();
     if (n > rule.most) return rule.quietWhenMore ? nullptr : ctx.Incomplete();
-    void* command = MakeCommand(code, Fields(ctx));
-    return command ? ctx.Store(command, code) : nullptr;
+    T* command = new T;
+    Fill(*command, Fields(ctx));
+    return ctx.Store(command, code);
 }
+
+}  // namespace
+
+#define CARNET_DRAWING_READER(code, cls, ...) \
+    void* ReadElement(ReadContext& ctx, ElementTag<cls>) { return ReadCommand<cls>(ctx); }
+CARNET_DRAWING_TYPES(CARNET_DRAWING_READER)
+#undef CARNET_DRAWING_READER
 
 }  // namespace carnet_reader

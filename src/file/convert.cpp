@@ -9,7 +9,9 @@
 void CCarnet::changeObjectIntoComment(CNorvexTxtWnd* pWnd, int i) {
     assert(isValid(i));
     const unsigned int code = m_Types.GetAt(i);
-    if (code < 1001 || code > CARNET_LAST_TYPE || code == 1007) return;
+    // A comment stays as it is; a type without a one-line file text (a
+    // traverse path) cannot become one.
+    if (code == TypeCode<CComment>::value) return;
     void* old = m_Elements.GetAt(i);
     const ElementOps* ops = ElementOpsFor(code);
     if (!old || !ops || !ops->infos) return;
@@ -23,7 +25,7 @@ void CCarnet::changeObjectIntoComment(CNorvexTxtWnd* pWnd, int i) {
 
 void CCarnet::changeCommentIntoObject(CNorvexTxtWnd* pWnd, int i) {
     assert(isValid(i));
-    if (m_Types.GetAt(i) != 1000) return;
+    if (m_Types.GetAt(i) != TypeCode<CComment>::value) return;
     auto* comment = static_cast<CComment*>(m_Elements.GetAt(i));
     if (!comment) return;
     CString text = comment->Str();
@@ -31,5 +33,5 @@ void CCarnet::changeCommentIntoObject(CNorvexTxtWnd* pWnd, int i) {
     void* made = ReadLine(pWnd, text, index, 0);
     // A new path is appended rather than written over the comment; the
     // comment then stays, so nothing is lost and nothing is freed twice.
-    if (made && m_Elements.GetAt(i) == made) removeElement(comment, 1000);
+    if (made && m_Elements.GetAt(i) == made) removeElement(comment, TypeCode<CComment>::value);
 }

@@ -46,6 +46,12 @@ const std::unordered_map<std::string_view, unsigned int>& Keywords() {
     return map;
 }
 
+// The reader of each type code, built from the type table.
+using Reader = void* (*)(ReadContext& ctx);
+#define CARNET_READER_ROW(code, cls, ...) [](ReadContext& ctx) { return ReadElement(ctx, ElementTag<cls>{}); },
+constexpr Reader kReaders[] = {CARNET_ELEMENT_TYPES(CARNET_READER_ROW)};
+#undef CARNET_READER_ROW
+
 }  // namespace
 
 const std::vector<std::string_view>& LineCut::Words() const {
@@ -135,9 +141,7 @@ void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int&
         if (!bAppend && ReadOptionLine(ctx)) return nullptr;
         return ctx.Incorrect();
     }
-    const unsigned int code = it->second;
-    if (code < CARNET_FIRST_DRAWING_TYPE) return ReadRecordLine(ctx, code);
-    return ReadDrawingLine(ctx, code);
+    return kReaders[it->second - CARNET_FIRST_TYPE](ctx);
 }
 
 }  // namespace carnet_reader

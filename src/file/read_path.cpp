@@ -8,10 +8,10 @@
 
 namespace carnet_reader {
 
-void* ReadPath(ReadContext& ctx) {
+void* ReadElement(ReadContext& ctx, ElementTag<CChemin>) {
     CCarnet& book = ctx.book;
     const size_t n = ctx.WordCount();
-    if (!book.isEmpty() && book.typLast() == 1007 && book.ptrLast()) {
+    if (!book.isEmpty() && book.typLast() == TypeCode<CChemin>::value && book.ptrLast()) {
         auto* last = static_cast<CChemin*>(const_cast<void*>(static_cast<const CCarnet&>(book).ptrLast()));
         if (n >= 1 && last->Np().str() == ctx.WordAt(0)) {
             if (n < 2) return ctx.Incomplete();
@@ -23,12 +23,12 @@ void* ReadPath(ReadContext& ctx) {
     }
     if (n < 3) return ctx.Incomplete();
     auto path = std::make_unique<CChemin>(ctx.Word(0));
-    path->setAntenne(ctx.cut.keyword == CarnetTypeInfo(1007)->keywords[1] ? 0 : 1);
+    path->setAntenne(ctx.cut.keyword == CarnetTypeInfo(TypeCode<CChemin>::value)->keywords[1] ? 0 : 1);
     for (size_t i = 1; i < n; ++i) path->add(ctx.Word(i));
     // A word that add refuses (one that begins with a hyphen) is no station:
     // a path of fewer than two would be saved as a line that cannot load.
     if (path->length() < 2) return ctx.Incomplete();
-    book.append(path.get(), 1007);
+    book.append(path.get(), TypeCode<CChemin>::value);
     return path.release();
 }
 

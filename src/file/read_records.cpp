@@ -55,39 +55,18 @@ bool IsCoordinate(std::string_view w) {
     return numconv::Format("%.*f", decimals, numconv::Atof(w)) == w;
 }
 
-void* ReadText(ReadContext& ctx, unsigned int code) {
+// A comment or a command: the rest of the line, whole.
+template <class Text>
+void* ReadText(ReadContext& ctx) {
     if (ctx.cut.rest.empty()) return ctx.Incomplete();
-    CString text{std::string(ctx.cut.rest)};
-    if (code == 1000) return ctx.Store(new CComment(text), code);
-    return ctx.Store(new CCommand(text), code);
+    return ctx.Store(new Text(CString(std::string(ctx.cut.rest))), TypeCode<Text>::value);
 }
 
-void* ReadAppareil(ReadContext& ctx) {
-    if (ctx.WordCount() < 7) return ctx.Incomplete();
-    std::string name;
-    for (size_t i = 6; i < ctx.WordCount(); ++i) {
-        if (i > 6) name += ' ';
-        name += ctx.WordAt(i);
-    }
-    return ctx.Store(new CAppareil(CString(std::move(name)), ctx.Number(0), ctx.Number(1), ctx.Number(2),
-                                   ctx.Number(3), ctx.Number(4), ctx.Number(5)),
-                     1008);
-}
-
-void* ReadStation(ReadContext& ctx) {
+// A reference or a measure: 2 or 3 words (the name, AH and perhaps the
+// symbol), or 5 or 6 words (the name, HP, AH, AV, DI and perhaps the symbol).
+template <class Observation>
+void* ReadObservation(ReadContext& ctx) {
     const size_t n = ctx.WordCount();
-    if (n < 2 || n > 4) return ctx.Incomplete();
-    double v0 = n >= 3 ? ctx.Number(2) : UNDEF_VALUE;
-    // The writer marks an absent orientation as -1: read it back as absent,
-    // so a station saved without orientation loads as the same station.
-    if (v0 == -1.0) v0 = UNDEF_VALUE;
-    return ctx.Store(new CStation(ctx.Word(0), ctx.Number(1), v0, n == 4 ? SymbolWord(ctx, 3) : CString()), 1001);
-}
-
-void* ReadObservation(ReadContext& ctx, unsigned int code) {
-    const size_t n = ctx.WordCount();
-    // 2 or 3 words: the name, AH and perhaps the symbol; 5 or 6 words: the
-    // name, HP, AH, AV, DI and perhaps the symbol.
     const size_t count = n == 2 || n == 3 ? 1 : (n == 5 || n == 6 ? 4 : 0);
     if (count == 0) return ctx.Incomplete();
     double values[4];
@@ -100,16 +79,68 @@ void* ReadObservation(ReadContext& ctx, unsigned int code) {
         if (IsUndef(values[i])) return ctx.Incomplete();
     }
     const CString sy = n == 3 || n == 6 ? SymbolWord(ctx, n - 1) : CString();
-    auto make = [code](auto&&... args) -> CReference* {
-        if (code == 1003) return new CMesure(args...);
-        return new CReference(args...);
-    };
-    CReference* r = count == 1 ? make(ctx.Word(0), values[0], sy)
-                               : make(ctx.Word(0), values[0], values[1], values[2], values[3], sy);
-    return ctx.Store(r, code);
+    Observation* r = count == 1 ? new Observation(ctx.Word(0), values[0], sy)
+                                : new Observation(ctx.Word(0), values[0], values[1], values[2], values[3], sy);
+    return ctx.Store(r, TypeCode<Observation>::value);
 }
 
-void* ReadPoint(ReadContext& ctx) {
+template <class Reading>
+void* ReadLevelling(ReadContext& ctx) {
+    const size_t n = ctx.WordCount();
+    if (n < 2 || n > 4) return ctx.Incomplete();
+    double values[2];
+    int count = 0;
+    CString sy;
+    for (size_t i = 1; i < n; ++i) {
+        std::string_view w = ctx.WordAt(i);
+        // Words 2 and 3 are values when they hold a point; word 4 only while
+        // fewer than two values were found. Any other word replaces the symbol.
+        if (HasDot(w) && (i < 3 || count < 2)) {
+            values[count++] = numconv::Atof(w);
+        } else {
+            sy = SymbolWord(ctx, i);
+        }
+    }
+    // An absent reading is written as blanks and would come back as the
+    // distance (an absent distance comes back as itself).
+    if (count == 0 || IsUndef(values[0])) return ctx.Incomplete();
+    return ctx.Store(new Reading(ctx.Word(0), values[0], count == 2 ? values[1] : UNDEF_VALUE, sy),
+                     TypeCode<Reading>::value);
+}
+
+}  // namespace
+
+void* ReadElement(ReadContext& ctx, ElementTag<CComment>) { return ReadText<CComment>(ctx); }
+void* ReadElement(ReadContext& ctx, ElementTag<CCommand>) { return ReadText<CCommand>(ctx); }
+void* ReadElement(ReadContext& ctx, ElementTag<CReference>) { return ReadObservation<CReference>(ctx); }
+void* ReadElement(ReadContext& ctx, ElementTag<CMesure>) { return ReadObservation<CMesure>(ctx); }
+void* ReadElement(ReadContext& ctx, ElementTag<CLectAR>) { return ReadLevelling<CLectAR>(ctx); }
+void* ReadElement(ReadContext& ctx, ElementTag<CLectAV>) { return ReadLevelling<CLectAV>(ctx); }
+
+void* ReadElement(ReadContext& ctx, ElementTag<CAppareil>) {
+    if (ctx.WordCount() < 7) return ctx.Incomplete();
+    std::string name;
+    for (size_t i = 6; i < ctx.WordCount(); ++i) {
+        if (i > 6) name += ' ';
+        name += ctx.WordAt(i);
+    }
+    return ctx.Store(new CAppareil(CString(std::move(name)), ctx.Number(0), ctx.Number(1), ctx.Number(2),
+                                   ctx.Number(3), ctx.Number(4), ctx.Number(5)),
+                     TypeCode<CAppareil>::value);
+}
+
+void* ReadElement(ReadContext& ctx, ElementTag<CStation>) {
+    const size_t n = ctx.WordCount();
+    if (n < 2 || n > 4) return ctx.Incomplete();
+    double v0 = n >= 3 ? ctx.Number(2) : UNDEF_VALUE;
+    // The writer marks an absent orientation as -1: read it back as absent,
+    // so a station saved without orientation loads as the same station.
+    if (v0 == -1.0) v0 = UNDEF_VALUE;
+    return ctx.Store(new CStation(ctx.Word(0), ctx.Number(1), v0, n == 4 ? SymbolWord(ctx, 3) : CString()),
+                     TypeCode<CStation>::value);
+}
+
+void* ReadElement(ReadContext& ctx, ElementTag<CPointGen>) {
     const size_t n = ctx.WordCount();
     if (n < 2) return ctx.Incomplete();
     size_t next = 1;
@@ -147,57 +178,15 @@ void* ReadPoint(ReadContext& ctx) {
     }
     p->m_bXConst = (lock & 1) ? 1 : 0;
     p->m_bZConst = (lock & 2) ? 1 : 0;
-    return ctx.Store(p, 1006);
+    return ctx.Store(p, TypeCode<CPointGen>::value);
 }
 
-template <class Reading>
-void* ReadLevelling(ReadContext& ctx, unsigned int code) {
-    const size_t n = ctx.WordCount();
-    if (n < 2 || n > 4) return ctx.Incomplete();
-    double values[2];
-    int count = 0;
-    CString sy;
-    for (size_t i = 1; i < n; ++i) {
-        std::string_view w = ctx.WordAt(i);
-        // Words 2 and 3 are values when they hold a point; word 4 only while
-        // fewer than two values were found. Any other word replaces the symbol.
-        if (HasDot(w) && (i < 3 || count < 2)) {
-            values[count++] = numconv::Atof(w);
-        } else {
-            sy = SymbolWord(ctx, i);
-        }
-    }
-    // An absent reading is written as blanks and would come back as the
-    // distance (an absent distance comes back as itself).
-    if (count == 0 || IsUndef(values[0])) return ctx.Incomplete();
-    return ctx.Store(new Reading(ctx.Word(0), values[0], count == 2 ? values[1] : UNDEF_VALUE, sy), code);
-}
-
-void* ReadExcent(ReadContext& ctx) {
+void* ReadElement(ReadContext& ctx, ElementTag<CExcent>) {
     if (ctx.WordCount() != 1) return ctx.Incomplete();
-    const CarnetElementType* row = CarnetTypeInfo(1010);
+    const CarnetElementType* row = CarnetTypeInfo(TypeCode<CExcent>::value);
     int kind = 0;
     while (kind < 2 && ctx.cut.keyword != row->keywords[kind]) ++kind;
-    return ctx.Store(new CExcent(kind, ctx.Number(0)), 1010);
-}
-
-}  // namespace
-
-void* ReadRecordLine(ReadContext& ctx, unsigned int code) {
-    switch (code) {
-        case 1000:
-        case 1009: return ReadText(ctx, code);
-        case 1001: return ReadStation(ctx);
-        case 1002:
-        case 1003: return ReadObservation(ctx, code);
-        case 1004: return ReadLevelling<CLectAR>(ctx, code);
-        case 1005: return ReadLevelling<CLectAV>(ctx, code);
-        case 1006: return ReadPoint(ctx);
-        case 1007: return ReadPath(ctx);
-        case 1008: return ReadAppareil(ctx);
-        case 1010: return ReadExcent(ctx);
-        default: return ctx.Incorrect();
-    }
+    return ctx.Store(new CExcent(kind, ctx.Number(0)), TypeCode<CExcent>::value);
 }
 
 }  // namespace carnet_reader

@@ -7,6 +7,7 @@
 
 #include <carnet/ccarnet.h>
 #include <carnet/cstring.h>
+#include <carnet/element_types.h>
 #include <carnet/txtwnd.h>
 
 namespace carnet_reader {
@@ -66,13 +67,18 @@ public:
 // ReadLine on a line held anywhere (the loader reads into its own buffer).
 void* ReadOneLine(CCarnet& book, CNorvexTxtWnd* wnd, std::string_view line, int& index, int bAppend);
 
-// The record branches (types 1000 to 1010); null when no element was made.
-void* ReadRecordLine(ReadContext& ctx, unsigned int code);
-// The drawing-command branches (types 1011 to 1065); null when no command
-// was made.
-void* ReadDrawingLine(ReadContext& ctx, unsigned int code);
-// Traverse-path lines, new paths and continuations.
-void* ReadPath(ReadContext& ctx);
+// The reader of each element class, named by its class: the words of the
+// line checked against the keyword, the element built and stored. Null when
+// no element was made (the reader reported why, or the line is dropped).
+// Declared here for every row of the type table; the records' readers are
+// in read_records.cpp and read_path.cpp, the drawing commands' in
+// read_drawing.cpp.
+template <class T>
+struct ElementTag {};
+#define CARNET_DECLARE_READER(code, cls, ...) void* ReadElement(ReadContext& ctx, ElementTag<cls>);
+CARNET_ELEMENT_TYPES(CARNET_DECLARE_READER)
+#undef CARNET_DECLARE_READER
+
 // Option lines: their values go to the stored parameters, never to the
 // book. False when the keyword is not an option keyword.
 bool ReadOptionLine(ReadContext& ctx);

@@ -36,13 +36,14 @@ std::string FillFormat(const char* fmt, const char* a, const char* b) {
     return out;
 }
 
+constexpr unsigned int kPoint = TypeCode<CPointGen>::value;
+
 void Say(CNorvexTxtWnd* wnd, const char* format, int line, const CString& name) {
     if (wnd) wnd->Printf(1, format, line, name.GetString());
 }
 
 template <class Observation>
-void NormaliseAndAdd(CCarnet& book, CNorvexTxtWnd* wnd, Observation* p, int line, unsigned int code,
-                     const char* incomplete) {
+void NormaliseAndAdd(CCarnet& book, CNorvexTxtWnd* wnd, Observation* p, int line, const char* incomplete) {
     std::string note;
     if (!IsUndef(p->Di()) && p->Di() < 0.0) {
         // A negative distance is a horizontal one.
@@ -61,7 +62,7 @@ void NormaliseAndAdd(CCarnet& book, CNorvexTxtWnd* wnd, Observation* p, int line
     if (!IsUndef(p->Hp()) && (!dPresent || !vPresent)) p->setHp(UNDEF_VALUE);
     if (p->isOk()) {
         if (!note.empty()) book.validComment(note.c_str(), " ", "");
-        book.append(p, code);
+        book.append(p, TypeCode<Observation>::value);
     } else if (!p->isTemp()) {
         Say(wnd, incomplete, line, p->Np());
         delete p;
@@ -72,13 +73,14 @@ void NormaliseAndAdd(CCarnet& book, CNorvexTxtWnd* wnd, Observation* p, int line
 
 void CCarnet::validComment(const char* fmt, const CString& a, const CString& b) {
     if (a.IsEmpty() || !fmt) return;
-    append(new CComment(CString(FillFormat(fmt, a.GetString(), b.IsEmpty() ? "" : b.GetString()))), 1000);
+    append(new CComment(CString(FillFormat(fmt, a.GetString(), b.IsEmpty() ? "" : b.GetString()))),
+           TypeCode<CComment>::value);
 }
 
 CStation* CCarnet::validStation(CNorvexTxtWnd* pWnd, CStation* p, int line) {
     if (!p) return nullptr;
     if (p->isOk()) {
-        append(p, 1001);
+        append(p, TypeCode<CStation>::value);
     } else {
         Say(pWnd, carnet_texts::kStationIncomplete, line, p->Np());
         delete p;
@@ -87,12 +89,12 @@ CStation* CCarnet::validStation(CNorvexTxtWnd* pWnd, CStation* p, int line) {
 }
 
 CReference* CCarnet::validReference(CNorvexTxtWnd* pWnd, CReference* p, int line) {
-    if (p) NormaliseAndAdd(*this, pWnd, p, line, 1002, carnet_texts::kReferenceIncomplete);
+    if (p) NormaliseAndAdd(*this, pWnd, p, line, carnet_texts::kReferenceIncomplete);
     return nullptr;
 }
 
 CMesure* CCarnet::validMesure(CNorvexTxtWnd* pWnd, CMesure* p, int line) {
-    if (p) NormaliseAndAdd(*this, pWnd, p, line, 1003, carnet_texts::kMesureIncomplete);
+    if (p) NormaliseAndAdd(*this, pWnd, p, line, carnet_texts::kMesureIncomplete);
     return nullptr;
 }
 
@@ -112,7 +114,7 @@ CPointGen* CCarnet::validPoint(CNorvexTxtWnd* pWnd, CPointGen* p, int line) {
         p->m_bZConst = 1;
     }
     if (line < 0) {
-        append(p, 1006);
+        append(p, kPoint);
         return nullptr;
     }
 
@@ -122,7 +124,7 @@ CPointGen* CCarnet::validPoint(CNorvexTxtWnd* pWnd, CPointGen* p, int line) {
     auto sameXY = [p](const CPointGen* e) {
         return (IsUndef(p->m_X) || p->m_X == e->m_X) && (IsUndef(p->m_Y) || p->m_Y == e->m_Y);
     };
-    for (int i = Find(1006, p->m_Np, 0, 0); i >= 0; i = i + 1 < length() ? Find(1006, p->m_Np, i + 1, 0) : -1) {
+    for (int i = Find(kPoint, p->m_Np, 0, 0); i >= 0; i = i + 1 < length() ? Find(kPoint, p->m_Np, i + 1, 0) : -1) {
         CPointGen* e = static_cast<CPointGen*>(ptrAt(i));
         ++found;
         auto takeSymbol = [&] {
@@ -178,6 +180,6 @@ CPointGen* CCarnet::validPoint(CNorvexTxtWnd* pWnd, CPointGen* p, int line) {
     if (conflict && pWnd) pWnd->Printf(1, carnet_texts::kPointDuplicated, p->m_Np.GetString());
     // Absorbed into the earlier points: the record stays with the caller.
     if (found > 0 && !conflict && merged + unchanged == found) return nullptr;
-    append(p, 1006);
+    append(p, kPoint);
     return nullptr;
 }

@@ -8,18 +8,23 @@
 
 namespace carnet_query {
 
-// The point number of an element, read in place (no copy), or null for a
-// type that has none (only types 1001 to 1007 carry one) or a null element.
-inline const CString* PointNumber(const void* p, unsigned int code) {
-    if (code < 1001 || code > 1007 || !p) return nullptr;
+// Whether the elements of a type code carry a point number.
+inline bool HasPointNumber(unsigned int code) {
     const ElementOps* ops = ElementOpsFor(code);
+    return ops && ops->np;
+}
+
+// The point number of an element, read in place (no copy), or null for a
+// type that has none or a null element.
+inline const CString* PointNumber(const void* p, unsigned int code) {
+    const ElementOps* ops = p ? ElementOpsFor(code) : nullptr;
     return ops && ops->np ? ops->np(p) : nullptr;
 }
 
-// The element at index i as a T when its type code is `code`, else null.
+// The element at index i as a T when it is of T's type, else null.
 template <class T>
-const T* ElementAs(const CCarnet& book, int i, unsigned int code) {
-    return book.typAt(i) == code ? static_cast<const T*>(book.ptrAt(i)) : nullptr;
+const T* ElementAs(const CCarnet& book, int i) {
+    return book.typAt(i) == TypeCode<T>::value ? static_cast<const T*>(book.ptrAt(i)) : nullptr;
 }
 
 }  // namespace carnet_query

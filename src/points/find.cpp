@@ -131,11 +131,30 @@ private:
 };
 
 template <class T>
-int Scan(const std::uint32_t* types, void* const* elements, unsigned int type, const std::string& wanted, int first,
-         int last, bool backwards) {
-    NamedScan<T> scan(types, elements, type, wanted);
+int Scan(const std::uint32_t* types, void* const* elements, const std::string& wanted, int first, int last,
+         bool backwards) {
+    NamedScan<T> scan(types, elements, TypeCode<T>::value, wanted);
     return backwards ? scan.Backward(first) : scan.Forward(first, last);
 }
+
+// A type without a point number matches no name.
+int NoNamedScan(const std::uint32_t*, void* const*, const std::string&, int, int, bool) { return -1; }
+
+using ScanFn = int (*)(const std::uint32_t* types, void* const* elements, const std::string& wanted, int first,
+                       int last, bool backwards);
+
+template <class T>
+constexpr ScanFn ScanOf() {
+    if constexpr (carnet_traits::HasNp<T>::value)
+        return &Scan<T>;
+    else
+        return &NoNamedScan;
+}
+
+// The named search of each type code, built from the type table.
+#define CARNET_SCAN_ROW(code, cls, ...) ScanOf<cls>(),
+constexpr ScanFn kScans[] = {CARNET_ELEMENT_TYPES(CARNET_SCAN_ROW)};
+#undef CARNET_SCAN_ROW
 
 }  // namespace
 
@@ -158,19 +177,8 @@ int CCarnet::Find(unsigned int type, const CString& np, int first, int end) cons
         }
         return -1;
     }
-    // Only types 1001 to 1007 carry a point number: a named search can match
-    // nothing else.
-    const std::string& wanted = np.str();
-    switch (type) {
-        case 1001: return Scan<CStation>(types, elements, type, wanted, first, last, backwards);
-        case 1002: return Scan<CReference>(types, elements, type, wanted, first, last, backwards);
-        case 1003: return Scan<CMesure>(types, elements, type, wanted, first, last, backwards);
-        case 1004: return Scan<CLectAR>(types, elements, type, wanted, first, last, backwards);
-        case 1005: return Scan<CLectAV>(types, elements, type, wanted, first, last, backwards);
-        case 1006: return Scan<CPointGen>(types, elements, type, wanted, first, last, backwards);
-        case 1007: return Scan<CChemin>(types, elements, type, wanted, first, last, backwards);
-        default: return -1;
-    }
+    if (!CarnetTypeInfo(type)) return -1;
+    return kScans[type - CARNET_FIRST_TYPE](types, elements, np.str(), first, last, backwards);
 }
 
 CString CCarnet::cmdAt(int i) {
@@ -196,12 +204,9 @@ CString CCarnet::matAt(int i) {
 CString CCarnet::symAt(int i) {
     assert(isValid(i));
     m_SymText.Empty();
-    const unsigned int code = m_Types.GetAt(i);
+    const ElementOps* ops = ElementOpsFor(m_Types.GetAt(i));
     const void* p = m_Elements.GetAt(i);
-    if (code >= 1001 && code <= 1006 && p) {
-        const ElementOps* ops = ElementOpsFor(code);
-        if (ops && ops->sy) m_SymText = *ops->sy(p);
-    }
+    if (ops && ops->sy && p) m_SymText = *ops->sy(p);
     return m_SymText;
 }
 

@@ -8,9 +8,6 @@
 
 namespace {
 
-constexpr unsigned int kAnyType = 999;
-constexpr unsigned int kStationType = 1001;
-
 bool IsDigitAt(const CString& s, int i) { return cp1252::IsDigit(static_cast<unsigned char>(s[i])); }
 
 bool HasStar(const CString& s) { return s.Find('*') >= 0; }
@@ -163,8 +160,9 @@ int CCarnet::extrStaRep(const CString& ref, CString& station, int& rep) const {
 
 int CCarnet::findStaRep(const CString& station, int rep) const {
     if (rep <= 0) return -1;
+    constexpr unsigned int kStation = TypeCode<CStation>::value;
     int found = 0;
-    for (int i = Find(kStationType, station, 0, 0); i >= 0; i = Find(kStationType, station, i + 1, 0))
+    for (int i = Find(kStation, station, 0, 0); i >= 0; i = Find(kStation, station, i + 1, 0))
         if (++found == rep) return i;
     return -1;
 }
@@ -197,7 +195,7 @@ CString CCarnet::lastMat(unsigned int type, int& index) {
     int n = 0;
     int d = 0;
     for (int i = 0; i < length(); ++i) {
-        if (type != kAnyType && typAt(i) != type) continue;
+        if (type != CARNET_ANY_TYPE && typAt(i) != type) continue;
         extrMat(matAt(i), r, n, d, 0);
         const int order = cp1252::Compare(r, bestRadical);
         if (order > 0 || (order == 0 && n > bestNumber)) {

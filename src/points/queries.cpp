@@ -14,14 +14,8 @@ using carnet_query::ElementAs;
 
 namespace {
 
-constexpr unsigned int kStation = 1001;
-constexpr unsigned int kReference = 1002;
-constexpr unsigned int kMesure = 1003;
-constexpr unsigned int kLectAR = 1004;
-constexpr unsigned int kLectAV = 1005;
-constexpr unsigned int kPoint = 1006;
-constexpr unsigned int kInstrument = 1008;
-constexpr unsigned int kExcent = 1010;
+constexpr unsigned int kStation = TypeCode<CStation>::value;
+constexpr unsigned int kPoint = TypeCode<CPointGen>::value;
 
 constexpr int kRadial = 0;
 constexpr int kTangential = 1;
@@ -29,8 +23,8 @@ constexpr int kVertical = 2;
 
 // A reference or a measure (a measure is a reference under another keyword).
 const CReference* ObservationAt(const CCarnet& book, int i) {
-    if (const CMesure* m = ElementAs<CMesure>(book, i, kMesure)) return m;
-    return ElementAs<CReference>(book, i, kReference);
+    if (const CMesure* m = ElementAs<CMesure>(book, i)) return m;
+    return ElementAs<CReference>(book, i);
 }
 
 template <class Get>
@@ -41,20 +35,20 @@ double ObservationValue(const CCarnet& book, int i, Get get) {
 
 template <class Get>
 double ReadingValue(const CCarnet& book, int i, Get get) {
-    if (const CLectAR* r = ElementAs<CLectAR>(book, i, kLectAR)) return get(*r);
-    if (const CLectAV* r = ElementAs<CLectAV>(book, i, kLectAV)) return get(*r);
+    if (const CLectAR* r = ElementAs<CLectAR>(book, i)) return get(*r);
+    if (const CLectAV* r = ElementAs<CLectAV>(book, i)) return get(*r);
     return UNDEF_VALUE;
 }
 
 template <class Get>
 double PointValue(const CCarnet& book, int i, Get get) {
-    const CPointGen* p = ElementAs<CPointGen>(book, i, kPoint);
+    const CPointGen* p = ElementAs<CPointGen>(book, i);
     return p ? get(*p) : UNDEF_VALUE;
 }
 
 template <class Get>
 double StationValue(const CCarnet& book, int i, Get get) {
-    const CStation* s = ElementAs<CStation>(book, i, kStation);
+    const CStation* s = ElementAs<CStation>(book, i);
     return s ? get(*s) : UNDEF_VALUE;
 }
 
@@ -102,8 +96,8 @@ double EccentricValue(const CCarnet& book, int i, int lower, int kind) {
     const int stop = lower < -1 ? -1 : lower;
     for (int j = i - 1; j > stop; --j) {
         const unsigned int t = book.typAt(j);
-        if (t >= kStation && t <= 1007) return 0.0;
-        if (t != kExcent) continue;
+        if (carnet_query::HasPointNumber(t)) return 0.0;
+        if (t != TypeCode<CExcent>::value) continue;
         const CExcent* e = static_cast<const CExcent*>(book.ptrAt(j));
         if (e && e->getTyp() == kind) return e->getVal();
     }
@@ -186,7 +180,7 @@ CAppareil* CCarnet::findAppAt(int i) const {
     assert(isValid(i));
     const int s = GoverningStation(*this, i);
     // An instrument placed after the station is not the one in force.
-    const int a = s > 0 ? Find(kInstrument, CString(), s - 1, -1) : -1;
+    const int a = s > 0 ? Find(TypeCode<CAppareil>::value, CString(), s - 1, -1) : -1;
     return a >= 0 ? static_cast<CAppareil*>(ptrAt(a)) : nullptr;
 }
 

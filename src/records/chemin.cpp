@@ -9,8 +9,7 @@
 
 namespace {
 
-constexpr unsigned int kStationType = 1001;
-constexpr unsigned int kPathType = 1007;
+constexpr unsigned int kStationType = TypeCode<CStation>::value;
 constexpr int kEntriesPerLine = 8;
 
 // One entry as given to add, insertAt or setAt, or a refusal.
@@ -179,7 +178,7 @@ int CChemin::isOk() const { return !m_Np.IsEmpty() && length() >= 2 ? 1 : 0; }
 
 const char* CChemin::FileKeyword() const {
     // The type table holds the antenna keyword first, the framed one second.
-    const CarnetElementType* row = CarnetTypeInfo(kPathType);
+    const CarnetElementType* row = CarnetTypeInfo(TypeCode<CChemin>::value);
     return row->keywords[m_bAntenne ? 0 : 1];
 }
 

@@ -1,4 +1,4 @@
-// A traverse path (element type 1007): a named, ordered list of the stations
+// A traverse path: a named, ordered list of the stations
 // that a traverse runs through, of the antenna kind ("CheminAntenne") or the
 // framed kind ("CheminEncadre").
 #pragma once

@@ -7,9 +7,6 @@
 
 namespace {
 
-constexpr unsigned int kCommentType = 1000;
-constexpr unsigned int kCommandType = 1009;
-
 // Keyword, one blank, then the text untouched.
 void TextLine(CString& out, unsigned int typeCode, const CString& text) {
     out.Empty();
@@ -20,7 +17,7 @@ void TextLine(CString& out, unsigned int typeCode, const CString& text) {
 
 }  // namespace
 
-void CComment::Infos(CString& out) const { TextLine(out, kCommentType, m_Str); }
+void CComment::Infos(CString& out) const { TextLine(out, TypeCode<CComment>::value, m_Str); }
 void CComment::Print(CNorvexTxtWnd* wnd, int n) const { carnet_record::PrintLine(*this, wnd, n); }
 void CComment::Write(std::FILE* f, int n) const { carnet_record::WriteLine(*this, f, n); }
 
@@ -35,6 +32,6 @@ void CCommand::addCmd(const char* s) {
     m_Cmd += s;
 }
 
-void CCommand::Infos(CString& out) const { TextLine(out, kCommandType, m_Cmd); }
+void CCommand::Infos(CString& out) const { TextLine(out, TypeCode<CCommand>::value, m_Cmd); }
 void CCommand::Print(CNorvexTxtWnd* wnd, int n) const { carnet_record::PrintLine(*this, wnd, n); }
 void CCommand::Write(std::FILE* f, int n) const { carnet_record::WriteLine(*this, f, n); }

@@ -1,5 +1,5 @@
-// Free-text elements: a comment (type 1000) and a command (type 1009), each
-// written back exactly as held.
+// Free-text elements: a comment and a command, each written back exactly as
+// held.
 #pragma once
 
 #include <cstdio>

@@ -1,15 +1,17 @@
-// Levelling staff readings: a backsight (type 1004) and a foresight (type
-// 1005). The two are twins built on one template; each has its own decimal
-// counts, its own keyword, and the foresight's display text is indented.
+// Levelling staff readings: a backsight (CLectAR) and a foresight (CLectAV).
+// The two are twins built on one template over the class itself; each has
+// its own decimal counts, its own type code and keyword from the type table,
+// and the foresight's display text is indented.
 #pragma once
 
 #include <cstdio>
 
 #include <carnet/cstring.h>
+#include <carnet/element_types.h>
 #include <carnet/txtwnd.h>
 #include <carnet/undef.h>
 
-template <unsigned int TypeCode, bool Foresight>
+template <class Self, bool Foresight>
 class CLectNiv {
 protected:
     CString m_Np;
@@ -63,15 +65,15 @@ protected:
     static double formatXY(double v);
 };
 
-extern template class CLectNiv<1004, false>;
-extern template class CLectNiv<1005, true>;
+extern template class CLectNiv<CLectAR, false>;
+extern template class CLectNiv<CLectAV, true>;
 
-class CLectAR : public CLectNiv<1004, false> {
+class CLectAR : public CLectNiv<CLectAR, false> {
 public:
     using CLectNiv::CLectNiv;
 };
 
-class CLectAV : public CLectNiv<1005, true> {
+class CLectAV : public CLectNiv<CLectAV, true> {
 public:
     using CLectNiv::CLectNiv;
 };

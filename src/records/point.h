@@ -1,4 +1,4 @@
-// A point given by its coordinates (element type 1006, keyword "Point").
+// A point given by its coordinates (keyword "Point").
 #pragma once
 
 #include <cstdio>

@@ -1,15 +1,9 @@
 #include <carnet/reference.h>
 
+#include <carnet/element_types.h>
 #include <carnet/numconv.h>
 
 #include "records/record_internal.h"
-
-namespace {
-
-constexpr unsigned int kReferenceType = 1002;
-constexpr unsigned int kMesureType = 1003;
-
-}  // namespace
 
 using carnet_record::IsUsable;
 
@@ -62,10 +56,10 @@ void CReference::InfosAs(CString& out, unsigned int typeCode) {
     out += m_Sy;
 }
 
-void CReference::Infos(CString& out) { InfosAs(out, kReferenceType); }
+void CReference::Infos(CString& out) { InfosAs(out, TypeCode<CReference>::value); }
 void CReference::Print(CNorvexTxtWnd* wnd, int n) { carnet_record::PrintLine(*this, wnd, n); }
 void CReference::Write(std::FILE* f, int n) { carnet_record::WriteLine(*this, f, n); }
 
-void CMesure::Infos(CString& out) { InfosAs(out, kMesureType); }
+void CMesure::Infos(CString& out) { InfosAs(out, TypeCode<CMesure>::value); }
 void CMesure::Print(CNorvexTxtWnd* wnd, int n) { carnet_record::PrintLine(*this, wnd, n); }
 void CMesure::Write(std::FILE* f, int n) { carnet_record::WriteLine(*this, f, n); }

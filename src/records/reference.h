@@ -1,6 +1,6 @@
-// Observations made from a station: a reference to a known point (type 1002)
-// and a measure of a point to be determined (type 1003). Both hold the same
-// fields; they differ only in the keyword of their file line.
+// Observations made from a station: a reference to a known point and a
+// measure of a point to be determined. Both hold the same fields; they
+// differ only in the keyword of their file line.
 #pragma once
 
 #include <cstdio>

@@ -7,14 +7,6 @@
 
 #include "records/record_internal.h"
 
-namespace {
-
-constexpr unsigned int kStationType = 1001;
-constexpr unsigned int kAppareilType = 1008;
-constexpr unsigned int kExcentType = 1010;
-
-}  // namespace
-
 // ---- CStation ----
 
 int CStation::m_DeciZ = 4;
@@ -43,7 +35,7 @@ void CStation::Params(CString& out) const {
 }
 
 void CStation::Infos(CString& out) {
-    carnet_record::StartLine(out, kStationType, m_Np);
+    carnet_record::StartLine(out, TypeCode<CStation>::value, m_Np);
     out.AppendFormat(" %9.6f ", m_Hi);
     // The file has no blank column for a missing orientation: -1 stands for it.
     const size_t v0At = out.str().size();
@@ -93,7 +85,7 @@ void CAppareil::Params(CString& out) const {
 
 void CAppareil::Infos(CString& out) const {
     out.Empty();
-    carnet_line::AppendKeyword(out, CarnetKeyword(kAppareilType));
+    carnet_line::AppendKeyword(out, CarnetKeyword(TypeCode<CAppareil>::value));
     out.AppendFormat(" %.6f %.6f %.6f %.6f %.6f %.1f ", m_CollVert, m_CstePrism, m_SigmaAh, m_SigmaAv, m_SigmaDi,
                      m_SigmaPpm);
     // The name is the last word of the line and the reader needs one: an
@@ -118,7 +110,7 @@ int CExcent::isTemp() const { return m_Typ == -1 && m_Val == 0.0 ? 1 : 0; }
 
 const char* CExcent::FileKeyword() const {
     if (m_Typ < 0 || m_Typ > 2) return "";
-    return CarnetTypeInfo(kExcentType)->keywords[m_Typ];
+    return CarnetTypeInfo(TypeCode<CExcent>::value)->keywords[m_Typ];
 }
 
 void CExcent::Params(CString& out) const {

@@ -1,6 +1,6 @@
-// How the following observations were made: the station set up on a point
-// (type 1001), the instrument in use (type 1008) and an eccentric offset
-// (type 1010).
+// How the following observations were made: the station set up on a point,
+// the instrument in use and an eccentric offset (their type codes are in
+// element_types.h).
 #pragma once
 
 #include <cstdio>

@@ -134,7 +134,7 @@ int Select(const std::string& path, const std::string& typed) {
     for (int i = 0; i < book.length(); ++i) {
         CString name = book.matAt(i);
         if (name.IsEmpty()) continue;
-        if (setUps && book.typAt(i) == 1001) name.AppendFormat("(%d)", ++setUpsSoFar[name.str()]);
+        if (setUps && book.typAt(i) == TypeCode<CStation>::value) name.AppendFormat("(%d)", ++setUpsSoFar[name.str()]);
         if (matcher.Contains(name)) rows.Add(i);
     }
     Put(selection.str() + "\n");

@@ -4,9 +4,11 @@
 #include <string>
 #include <vector>
 
+#include <carnet/element_types.h>
+
 namespace carnet_tool {
 
-constexpr unsigned int kAnyType = 999;  // the library's "every type"
+constexpr unsigned int kAnyType = CARNET_ANY_TYPE;  // the library's "every type"
 
 // browse.cpp
 int Check(const std::vector<std::string>& files);

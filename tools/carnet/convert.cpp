@@ -82,15 +82,15 @@ Interpreted InterpretAs(const CString& text, const CString& sep, const CCode& en
 
 // Only the drawing commands interpret typed codes; the survey records of the
 // table get no interpreter.
-template <unsigned int kCode, class T>
+template <class T>
 constexpr InterpretFn InterpreterOf() {
-    if constexpr (kCode >= CARNET_FIRST_DRAWING_TYPE)
+    if constexpr (IsDrawingCommand<T>::value)
         return &InterpretAs<T>;
     else
         return nullptr;
 }
 
-#define CARNET_TOOL_INTERPRETER(code, cls, ...) InterpreterOf<code, cls>(),
+#define CARNET_TOOL_INTERPRETER(code, cls, ...) InterpreterOf<cls>(),
 constexpr InterpretFn kInterpreters[] = {CARNET_ELEMENT_TYPES(CARNET_TOOL_INTERPRETER)};
 #undef CARNET_TOOL_INTERPRETER
 

@@ -34,7 +34,8 @@ bool TypeNamed(const std::string& arg, unsigned int& code) {
     for (code = CARNET_FIRST_TYPE; code <= CARNET_LAST_TYPE; ++code)
         for (const char* known : CarnetTypeInfo(code)->keywords)
             if (known && cp1252::CompareNoCase(known, keyword.c_str()) == 0) return true;
-    Say("carnet", "no element type is named " + keyword + " (a code from 1000 to 1065 or a keyword)");
+    Say("carnet", "no element type is named " + keyword + " (a code from " + std::to_string(CARNET_FIRST_TYPE) +
+                      " to " + std::to_string(CARNET_LAST_TYPE) + " or a keyword)");
     return false;
 }
 

@@ -9,8 +9,8 @@
 
 namespace carnet_tool {
 
-// The type code named on the command line by its number (1000 to 1065) or
-// by one of its keywords; false, with a message, for anything else.
+// The type code named on the command line by its number (one of the type
+// table) or by one of its keywords; false, with a message, for anything else.
 bool TypeNamed(const std::string& arg, unsigned int& code);
 
 // Rows of the elements at the positions added, printed on standard output.

@@ -14,7 +14,8 @@
 namespace carnet_tool {
 namespace {
 
-const unsigned int kStation = 1001, kPoint = 1006, kPath = 1007;
+const unsigned int kStation = TypeCode<CStation>::value, kPoint = TypeCode<CPointGen>::value,
+                   kPath = TypeCode<CChemin>::value;
 
 std::string Number(double v) { return numconv::Format("%.6f", v); }
 
