@@ -26,6 +26,8 @@ run: build
 	./build/release/bin/carnet list --numbers examples/chantier.geo
 	./build/release/bin/carnet show examples/chantier.geo --type Point
 	./build/release/bin/carnet export examples/chantier.geo --to svg -o build/chantier.svg
+	./build/release/bin/carnet projection examples/chantier.geo
+	./build/release/bin/carnet export examples/chantier.geo --to geojson -o build/chantier.geojson
 
 test: test-release test-asan
 

@@ -1,5 +1,6 @@
 // A host program built against the installed package.
 #include <carnet/carnet.h>
+#include <carnet/survey/crs.h>
 
 #include <cstdio>
 #include <cstring>
@@ -14,6 +15,10 @@ int main() {
         "000001  Point            P1               0    1000.250000    2000.500000 -999999.000000 arbre";
     if (std::strcmp(wnd.Texts()[0].c_str(), expected) != 0) {
         std::fprintf(stderr, "unexpected line: %s\n", wnd.Texts()[0].c_str());
+        return 1;
+    }
+    if (carnet::survey::Crs::FromBookName("Projection Lambert Zone II").Code() != "EPSG:27572") {
+        std::fprintf(stderr, "the survey library does not know zone II\n");
         return 1;
     }
     std::puts("consumer ok");

@@ -7,7 +7,8 @@ execute_process(COMMAND ${CMAKE_COMMAND} --install ${BINARY_DIR} --prefix ${WORK
 if(NOT rc EQUAL 0)
   message(FATAL_ERROR "install failed: ${rc}")
 endif()
-foreach(f include/carnet/carnet.h lib/pkgconfig/carnet.pc lib/cmake/carnet/carnetConfig.cmake)
+foreach(f include/carnet/carnet.h include/carnet/survey/crs.h lib/pkgconfig/carnet.pc lib/pkgconfig/carnet-survey.pc
+         lib/cmake/carnet/carnetConfig.cmake)
   if(NOT EXISTS ${WORK_DIR}/prefix/${f})
     message(FATAL_ERROR "missing from the install: ${f}")
   endif()

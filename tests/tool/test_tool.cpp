@@ -11,6 +11,8 @@
 #include <cstdio>
 
 #include <algorithm>
+#include <cctype>
+#include <map>
 #include <cstdlib>
 #include <set>
 #include <string>
@@ -42,6 +44,52 @@ std::vector<std::string> Lines(const std::string& text) {
         lines.push_back(text.substr(start, end - start));
     if (start < text.size()) lines.push_back(text.substr(start));
     return lines;
+}
+
+// The numbers of a text, in order.
+std::vector<double> Numbers(const std::string& text) {
+    std::vector<double> numbers;
+    for (const char* at = text.c_str(); *at;) {
+        char* end = nullptr;
+        const double v = std::strtod(at, &end);
+        if (end != at && (std::isdigit(static_cast<unsigned char>(*at)) || *at == '-' || *at == '.')) {
+            numbers.push_back(v);
+            at = end;
+        } else {
+            ++at;
+        }
+    }
+    return numbers;
+}
+
+std::string Shell(const std::string& command) {
+    std::string out;
+    if (std::FILE* p = popen(command.c_str(), "r")) {
+        char chunk[4096];
+        for (size_t n; (n = std::fread(chunk, 1, sizeof chunk, p)) > 0;) out.append(chunk, n);
+        pclose(p);
+    }
+    return out;
+}
+
+// What GDAL's ogrinfo reads of a file: each named feature's longitudes and
+// latitudes, in order (the height of a point left out).
+std::map<std::string, std::vector<double>> OgrPositions(const std::string& file) {
+    std::map<std::string, std::vector<double>> read;
+    std::string name;
+    for (const std::string& line : Lines(Shell("ogrinfo -ro -al -q '" + file + "'"))) {
+        const size_t label = line.find("ame (String) = ");
+        if (label != std::string::npos && label <= 3) name = line.substr(label + 15);
+        const size_t geometry = line.find_first_not_of(' ');
+        if (geometry == std::string::npos || name.empty()) continue;
+        const std::string kind = line.substr(geometry, line.find(' ', geometry) - geometry);
+        if (kind != "POINT" && kind != "LINESTRING" && kind != "MULTILINESTRING") continue;
+        std::vector<double> numbers = Numbers(line.substr(line.find('(')));
+        if (kind == "POINT") numbers.resize(2);
+        read[name] = numbers;
+        name.clear();
+    }
+    return read;
 }
 
 std::string Replace(std::string text, const std::string& from, const std::string& to) {
@@ -152,6 +200,9 @@ struct Case {
     std::vector<std::pair<std::string, std::string>> after;
 };
 
+// Two points of Lambert-93 in a book that declares no projection: the
+// origin (3 E, 46.5 N) and a point far south of France.
+const std::string kLambert93 = "Point A 0 700000.0 6600000.0 100.0 borne\nPoint B 0 700000.0 5000000.0 borne\n";
 const std::string kProfile = "[Options_Corrections]\nProjection=Projection Lambert Zone IV\nRayonTerre=8000\n";
 const std::string kOldTable = "ARB;9;Arbre\n\nHAIE;30;Haie;1;lib;3;2\r\nMUR;40;Mur;2;1\n";
 
@@ -324,9 +375,42 @@ const Case kCases[] = {
      {{"params.ini", kProfile}}},
     {"options of a missing profile file say so", "options --params $W/none.ini", {}, 0, "...\n",
      "$W/none.ini: no such profile file: these are the default options\n", {}},
-    {"projection of the example", "projection $EX", {}, 0, "Projection Lambert Zone II\n", "", {}},
-    {"projection of a book that declares none", "projection $W/p.geo", {{"p.geo", "Station S1 1.5\n"}}, 0, "",
-     "$W/p.geo: declares no projection\n", {}},
+    {"projection of the example: its system and the scale factor at its mean position",
+     "projection $EX",
+     {},
+     0,
+     "Projection Lambert Zone II\nsystem: EPSG:27572, NTF (Paris) / Lambert zone II\n"
+     "...\n"
+     "mean of 5 known points: X 601421.610  Y 2428923.049\n"
+     "WGS 84 there: longitude 2.35586878, latitude 48.85864099\n"
+     "scale factor there: 1.00052972 (+53.0 cm/km)\nmeridian convergence there: 0.0157 grad\n",
+     "",
+     {}},
+    {"projection of a book that declares none", "projection $W/p.geo", {{"p.geo", "Station S1 1.5\n"}}, 0,
+     "Aucune\nsystem: a local grid, with no reference system\n", "", {}},
+    {"projection of a name PROJ does not know: a local grid, said", "projection $W/p.geo",
+     {{"p.geo", "Option_Projec Rep\xE8re local\n"}}, 0,
+     "Rep\xE8re local\nsystem: a local grid, with no reference system\n",
+     "$W/p.geo: projection \"Rep\xE8re local\" is not a system PROJ knows (PROJ knows no coordinate system named "
+     "\"Rep\xE8re local\"): taken as a local grid\n", {}},
+    {"projection --crs names the system of a local grid; the mean outside its area is said",
+     "projection $W/p.geo --crs EPSG:2154", {{"p.geo", kLambert93}}, 0,
+     "Aucune\nsystem (--crs): EPSG:2154, RGF93 v1 / Lambert-93\n...\nmean of 2 known points: X 700000.000  Y "
+     "5800000.000\nWGS 84 there: longitude 3.00000000, latitude 39.31029066\n"
+     "scale factor there: 1.00665966 (+666.0 cm/km)\nmeridian convergence there: 0.0000 grad\n",
+     "$W/p.geo: the mean position lies outside the system's area of use\n", {}},
+    {"projection --crs of a name PROJ does not know", "projection $EX --crs EPSG:999999", {}, 2, "",
+     "--crs: PROJ knows no coordinate system named \"EPSG:999999\"\n", {}},
+    {"an export in longitude and latitude of a local grid is refused", "export $W/p.geo --to kml -o $W/p.kml",
+     {{"p.geo", kLambert93}}, 2, "",
+     "$W/p.geo: the book's coordinates are on a local grid (projection \"Aucune\"), and kml holds longitudes and "
+     "latitudes: give --crs with the system they are in, such as --crs EPSG:2154; nothing written\n",
+     {{"p.kml", ""}}},
+    {"an export names the points outside the system's area of use and keeps them",
+     "export $W/p.geo --to gpx --crs EPSG:2154", {{"p.geo", kLambert93}}, 0,
+     "...\n<wpt lat=\"46.500000000\" lon=\"3.000000000\"><ele>100.000000</ele><name>A</name><desc>borne</desc>"
+     "</wpt>\n<wpt lat=\"32.216383772\" lon=\"3.000000000\"><name>B</name><desc>borne</desc></wpt>\n</gpx>\n",
+     "$W/p.geo: outside the area of use of EPSG:2154: B; written all the same\n", {}},
     {"export of the points as CSV",
      "export $EX --to csv",
      {},
@@ -417,7 +501,7 @@ const Case kCases[] = {
      {{std::string(251, 'n') + ".geo", Example()}}, 0, "", "", {{std::string(251, 'n') + ".geo", Example()}}},
     {"no subcommand prints the help", "", {}, 0, "carnet: inspect, query, convert and export land-surveying field books (.geo files)\n...\n", "", {}},
     {"a usage error", "export $EX --to pdf", {}, 2, "",
-     "carnet: --to: pdf not in {csv,geojson,dxf,svg}\ncarnet --help tells how to use it\n", {}},
+     "carnet: --to: pdf not in {csv,geojson,kml,gpx,dxf,svg}\ncarnet --help tells how to use it\n", {}},
     {"a missing argument", "check", {}, 2, "", "carnet: files is required\ncarnet --help tells how to use it\n", {}},
     {"--version names the licenses", "--version", {}, 0,
      "carnet 0.1.0\nThis tool is free software under the GNU General Public License, version 2 or\n...\n", "", {}},
@@ -464,29 +548,57 @@ TEST_F(Tool, EverySubcommandHelpHasAnExample) {
 
 // The exports opened by the readers of other programs.
 TEST_F(Tool, ExportsOpenInTheirReaders) {
-    for (const char* format : {"geojson", "dxf", "svg"})
+    for (const char* format : {"geojson", "kml", "gpx", "dxf", "svg"})
         ASSERT_EQ(Carnet("export $EX --to " + std::string(format) + " -o $W/c." + format).status, 0) << format;
 
+    // GeoJSON as RFC 7946 has it: longitude, latitude and height; the book's
+    // own coordinates and its system beside them.
     EXPECT_EQ(Python("import json, sys\n"
                      "d = json.load(open(sys.argv[1], encoding='utf-8'))\n"
-                     "print(d['type'], d['name'], d['projection'])\n"
+                     "print(d['type'], d['name'], d['projection'], d['source_crs'], d['source_crs_name'])\n"
                      "for f in d['features']:\n"
                      "    g = f['geometry']\n"
                      "    p = f['properties']\n"
-                     "    print(g and g['type'], g and g['coordinates'], p['name'], p.get('code'), p.get('locks'),\n"
-                     "          p.get('station'), p.get('kind'), p.get('stations'))\n",
+                     "    print(g and g['type'], g and len(g['coordinates']), p['name'], p.get('code'),\n"
+                     "          p.get('x'), p.get('y'), p.get('z'), p.get('locks'), p.get('station'), p.get('kind'),\n"
+                     "          p.get('stations'))\n",
                      Path("work/c.geojson")),
-              "FeatureCollection chantier.geo Projection Lambert Zone II\n"
-              "Point [601234.512, 2428765.331, 151.874] S1 borne OGE 3 True None None\n"
-              "Point [601404.571, 2428836.18] S2 calcul\xC3\xA9 0 True None None\n"
-              "Point [601319.484, 2428962.936, 153.518] S3 borne OGE 3 True None None\n"
-              "Point [601259.484, 2429038.296] S4 calcul\xC3\xA9 0 True None None\n"
-              "Point [601890.0, 2429012.5] R100 clocher 1 False None None\n"
-              "None None NGF12 rep\xC3\xA8re NGF 2 False None None\n"
-              "LineString [[601234.512, 2428765.331], [601404.571, 2428836.18], [601319.484, 2428962.936]] C1 "
-              "None None None framed ['S1-1', 'S2-1', 'S3-1']\n"
-              "LineString [[601319.484, 2428962.936], [601259.484, 2429038.296]] C2 None None None antenna "
-              "['S3-1', 'S4-1']\n");
+              "FeatureCollection chantier.geo Projection Lambert Zone II EPSG:27572 NTF (Paris) / Lambert zone II\n"
+              "Point 3 S1 borne OGE 601234.512 2428765.331 151.874 3 True None None\n"
+              "Point 2 S2 calcul\xC3\xA9 601404.571 2428836.18 None 0 True None None\n"
+              "Point 3 S3 borne OGE 601319.484 2428962.936 153.518 3 True None None\n"
+              "Point 2 S4 calcul\xC3\xA9 601259.484 2429038.296 None 0 True None None\n"
+              "Point 2 R100 clocher 601890.0 2429012.5 None 1 False None None\n"
+              "None None NGF12 rep\xC3\xA8re NGF None None 150.412 2 False None None\n"
+              "LineString 3 C1 None None None None None None framed ['S1-1', 'S2-1', 'S3-1']\n"
+              "LineString 2 C2 None None None None None None antenna ['S3-1', 'S4-1']\n");
+
+    // GDAL reads each of the three where PROJ's cs2cs puts the book's points.
+    const std::vector<std::pair<std::string, std::vector<const char*>>> placed = {
+        {"S1", {"601234.512 2428765.331"}}, {"S2", {"601404.571 2428836.18"}},
+        {"S3", {"601319.484 2428962.936"}}, {"S4", {"601259.484 2429038.296"}},
+        {"R100", {"601890.0 2429012.5"}},
+        {"C1", {"601234.512 2428765.331", "601404.571 2428836.18", "601319.484 2428962.936"}},
+        {"C2", {"601319.484 2428962.936", "601259.484 2429038.296"}}};
+    std::map<std::string, std::vector<double>> expected;
+    for (const auto& [name, grid] : placed)
+        for (const char* xy : grid) {
+            const std::vector<double> latLon =
+                Numbers(Shell("echo " + std::string(xy) + " | cs2cs -f %.10f EPSG:27572 EPSG:4326"));
+            ASSERT_GE(latLon.size(), 2u) << xy;
+            expected[name].push_back(latLon[1]);
+            expected[name].push_back(latLon[0]);
+        }
+    for (const char* format : {"geojson", "kml", "gpx"}) {
+        SCOPED_TRACE(format);
+        const auto read = OgrPositions(Path(std::string("work/c.") + format));
+        ASSERT_EQ(read.size(), expected.size()) << Shell("ogrinfo -ro -al -q " + Path(std::string("work/c.") + format));
+        for (const auto& [name, numbers] : expected) {
+            ASSERT_EQ(read.count(name), 1u) << name;
+            ASSERT_EQ(read.at(name).size(), numbers.size()) << name;
+            for (size_t k = 0; k < numbers.size(); ++k) EXPECT_NEAR(read.at(name)[k], numbers[k], 2e-9) << name;
+        }
+    }
 
     EXPECT_EQ(Python("import sys, ezdxf\n"
                      "doc = ezdxf.readfile(sys.argv[1])\n"
@@ -564,7 +676,7 @@ TEST_F(Tool, LargeGeneratedBook) {
     EXPECT_EQ(Carnet("format $W/big.geo -o $W/big2.geo").status, 0);
     EXPECT_EQ(Carnet("check $W/big2.geo").out, Path("work/big2.geo") + ": 200000 elements loaded, 0 lines rejected\n");
     for (const char* format : {"csv", "geojson", "dxf", "svg"}) {
-        run = Carnet("export $W/big.geo --to " + std::string(format) + " -o $W/big." + format);
+        run = Carnet("export $W/big.geo --crs EPSG:27572 --to " + std::string(format) + " -o $W/big." + format);
         EXPECT_EQ(run.status, 0) << format << run.err;
         EXPECT_EQ(run.err, "") << format;
     }
@@ -710,4 +822,20 @@ TEST_F(Tool, OutOfMemoryIsAMessage) {
     const int raw = std::system(cmd.c_str());
     EXPECT_TRUE(WIFEXITED(raw) && WEXITSTATUS(raw) == 2);
     EXPECT_EQ(ReadFile(Path("err.txt")), "carnet: out of memory\n");
+}
+
+// Without PROJ's database the exports in longitude and latitude stop, saying
+// why, and write nothing; those in the book's metres need no database.
+TEST_F(Tool, WithoutProjDatabase) {
+    const char* saved = std::getenv("PROJ_DATA");
+    const std::string keep = saved ? saved : "";
+    setenv("PROJ_DATA", "/nonexistent-carnet", 1);
+    const Outcome geo = Carnet("export $EX --to geojson -o $W/c.geojson");
+    const Outcome csv = Carnet("export $EX --to csv -o $W/c.csv");
+    saved ? setenv("PROJ_DATA", keep.c_str(), 1) : unsetenv("PROJ_DATA");
+    EXPECT_EQ(geo.status, 2);
+    EXPECT_EQ(geo.err, kExample + ": PROJ's database (proj.db) cannot be found; install Debian's proj-data or set "
+                                  "PROJ_DATA to the folder that holds it\n" + kExample + ": nothing written\n");
+    EXPECT_EQ(Entries(Path("work")), std::vector<std::string>{"c.csv"});
+    EXPECT_EQ(csv.status, 0);
 }

@@ -1,5 +1,5 @@
-// The commands that read a book, a parameter location or a file's projection
-// and show what they find.
+// The commands that read a book or a parameter location and show what they
+// find.
 #include <sys/stat.h>
 
 #include <algorithm>
@@ -15,11 +15,6 @@
 
 namespace carnet_tool {
 namespace {
-
-void Put(const std::string& cp1252) {
-    const std::string text = ForOutput(cp1252, CurrentSession().output);
-    std::fwrite(text.data(), 1, text.size(), stdout);
-}
 
 // A book loaded for reading: the rows can be shown even when some lines were
 // rejected, and the status then says so.
@@ -162,19 +157,6 @@ int Options(const std::string& location) {
     char chunk[4096];
     for (size_t n; (n = std::fread(chunk, 1, sizeof chunk, f.get())) > 0;) lines.append(chunk, n);
     Put(lines);
-    return kOk;
-}
-
-int ShowProjection(const std::string& path) {
-    Input input;
-    const int status = ReadInput(path, input);
-    if (status != kOk) return status;
-    CString name;
-    CCarnet::ProjectionOfBytes(input.Bytes(), name);
-    if (name.IsEmpty())
-        Say(path, "declares no projection");
-    else
-        Put(name.str() + "\n");
     return kOk;
 }
 

@@ -18,7 +18,6 @@ int Find(const std::string& path, const std::string& name);
 int Next(const std::string& path, const std::string& type);
 int Select(const std::string& path, const std::string& selection);
 int Options(const std::string& location);
-int ShowProjection(const std::string& path);
 
 // convert.cpp
 int Format(const std::string& path, const std::string& output, bool backup, const std::string& params);
@@ -27,6 +26,10 @@ int Interpret(const std::string& keyword, const std::string& text, const std::st
 int ListDrawingKeywords();
 
 // export.cpp
-int Export(const std::string& path, const std::string& format, const std::string& output);
+int Export(const std::string& path, const std::string& format, const std::string& output,
+           const std::string& crs);
+
+// projection.cpp
+int ShowProjection(const std::string& path, const std::string& crs);
 
 }  // namespace carnet_tool

@@ -16,11 +16,6 @@
 namespace carnet_tool {
 namespace {
 
-void Put(const std::string& cp1252) {
-    const std::string text = ForOutput(cp1252, CurrentSession().output);
-    std::fwrite(text.data(), 1, text.size(), stdout);
-}
-
 // Makes the backup that must exist before the book's only copy is
 // overwritten; false, with the reason, when it cannot be made.
 bool BackedUp(CCarnet& book) {

@@ -12,7 +12,7 @@
 namespace carnet_tool {
 namespace {
 
-void Put(const std::string& text) { std::fwrite(text.data(), 1, text.size(), stdout); }
+void PutShown(const std::string& text) { std::fwrite(text.data(), 1, text.size(), stdout); }
 
 // A column that is empty in every row takes no room.
 void Pad(std::string& line, const CString& text, size_t width) {
@@ -58,19 +58,19 @@ void ElementRows::PrintColumns() {
         Pad(line, m_book.symAt(i), wide[2]);
         line += m_book.parAt(i).str();
         line.erase(line.find_last_not_of(' ') + 1);
-        Put(ForOutput(line, encoding) + "\n");
+        PutShown(ForOutput(line, encoding) + "\n");
     }
 }
 
 void ElementRows::PrintJson() {
-    Put("[\n");
+    PutShown("[\n");
     for (size_t k = 0; k < m_rows.size(); ++k) {
         const int i = m_rows[k];
-        Put(numconv::Format("{\"position\": %d, \"keyword\": ", i + 1) + JsonString(m_book.cmdAt(i).str()) +
+        PutShown(numconv::Format("{\"position\": %d, \"keyword\": ", i + 1) + JsonString(m_book.cmdAt(i).str()) +
             ", \"number\": " + JsonString(m_book.matAt(i).str()) + ", \"code\": " + JsonString(m_book.symAt(i).str()) +
             ", \"text\": " + JsonString(m_book.parAt(i).str()) + (k + 1 < m_rows.size() ? "},\n" : "}\n"));
     }
-    Put("]\n");
+    PutShown("]\n");
 }
 
 std::string JsonString(const std::string& cp1252) {

@@ -1,4 +1,5 @@
-// carnet export: the points and paths of a book as CSV, GeoJSON, DXF or SVG.
+// carnet export: the points and paths of a book as CSV, DXF or SVG in its
+// own metres, or as GeoJSON, KML or GPX in WGS 84.
 #include "export.h"
 
 #include <algorithm>
@@ -6,6 +7,7 @@
 #include <unordered_map>
 
 #include <carnet/carnet.h>
+#include <carnet/survey/book.h>
 
 #include "commands.h"
 #include "elements.h"
@@ -32,14 +34,16 @@ bool Puts(std::FILE* f, const std::string& text) { return std::fwrite(text.data(
 
 std::string JsonNumber(double v) { return IsUndef(v) ? std::string("null") : Number(v); }
 
-std::string JsonPosition(double x, double y, double z) {
-    return "[" + Number(x) + ", " + Number(y) + (IsUndef(z) ? std::string() : ", " + Number(z)) + "]";
+// A WGS 84 position, longitude first: nine decimals of a degree are a tenth
+// of a millimetre, what a survey can tell.
+std::string JsonPosition(double lon, double lat, double z) {
+    return numconv::Format("[%.9f, %.9f", lon, lat) + (IsUndef(z) ? std::string() : ", " + Number(z)) + "]";
 }
 
 std::string JsonGeometry(const ExportPath& path) {
     auto line = [](const std::vector<Vertex>& part) {
         std::string text = "[";
-        for (const Vertex& v : part) text += (text.size() > 1 ? ", " : "") + JsonPosition(v.x, v.y, UNDEF_VALUE);
+        for (const Vertex& v : part) text += (text.size() > 1 ? ", " : "") + JsonPosition(v.lon, v.lat, UNDEF_VALUE);
         return text + "]";
     };
     if (path.parts.size() == 1) return "{\"type\": \"LineString\", \"coordinates\": " + line(path.parts[0]) + "}";
@@ -55,9 +59,8 @@ Survey Gather(CCarnet& book, const std::string& path) {
     Survey survey;
     const size_t slash = path.rfind('/');
     survey.title = slash == std::string::npos ? path : path.substr(slash + 1);
-    CString projection;
-    GetParamString(CurrentSession().store.Location().c_str(), "Options_Corrections", "Projection", "", &projection);
-    if (projection != "Aucune") survey.projection = projection.str();
+    const std::string projection = carnet::survey::ProjectionName(book);
+    if (projection != "Aucune") survey.projection = projection;
 
     // The first point of each number, as the book's lookups find it, and
     // the numbers that stations are set up on: one pass, not one per query.
@@ -136,16 +139,18 @@ bool WriteCsv(const Survey& survey, std::FILE* f) {
 bool WriteGeoJson(const Survey& survey, std::FILE* f) {
     bool ok = Puts(f, "{\"type\": \"FeatureCollection\", \"name\": " + JsonString(survey.title) +
                           (survey.projection.empty() ? "" : ", \"projection\": " + JsonString(survey.projection)) +
-                          ",\n\"features\": [");
+                          ", \"source_crs\": " + JsonString(survey.crs) +
+                          ", \"source_crs_name\": " + JsonString(survey.crsName) + ",\n\"features\": [");
     const char* separator = "\n";
     for (const ExportPoint& p : survey.points) {
-        // A point known in height only has no place on the plan.
-        const std::string geometry = p.HasXY() ? "{\"type\": \"Point\", \"coordinates\": " +
-                                                     JsonPosition(p.x, p.y, p.z) + "}"
-                                               : std::string("null");
+        // A point known in height only has no place on the map.
+        const std::string geometry = p.placed ? "{\"type\": \"Point\", \"coordinates\": " +
+                                                    JsonPosition(p.lon, p.lat, p.z) + "}"
+                                              : std::string("null");
         ok = Puts(f, separator + std::string("{\"type\": \"Feature\", \"geometry\": ") + geometry +
                          ", \"properties\": {\"name\": " + JsonString(p.name) + ", \"code\": " + JsonString(p.code) +
-                         ", \"z\": " + JsonNumber(p.z) + ", \"locks\": " + std::to_string(p.locks) +
+                         ", \"x\": " + JsonNumber(p.x) + ", \"y\": " + JsonNumber(p.y) + ", \"z\": " +
+                         JsonNumber(p.z) + ", \"locks\": " + std::to_string(p.locks) +
                          ", \"station\": " + (p.station ? "true" : "false") + "}}") &&
              ok;
         separator = ",\n";
@@ -162,19 +167,84 @@ bool WriteGeoJson(const Survey& survey, std::FILE* f) {
     return Puts(f, "\n]}\n") && ok;
 }
 
-int Export(const std::string& path, const std::string& format, const std::string& output) {
+// Places the survey in WGS 84 from `crs`. What PROJ cannot place is named
+// and written without a position; a point outside the system's area of use
+// is named and kept.
+static void Place(Survey& survey, const carnet::survey::Crs& crs, const std::string& path) {
+    survey.crs = FromProj(crs.Code().empty() ? crs.Definition() : crs.Code());
+    survey.crsName = FromProj(crs.Name());
+    std::vector<std::string> outside, failed;
+    for (ExportPoint& p : survey.points) {
+        if (!p.HasXY()) continue;
+        const auto at = crs.ToWgs84(p.x, p.y);
+        if (!at) {
+            failed.push_back(p.name);
+            continue;
+        }
+        p.placed = true;
+        p.lon = at->lon;
+        p.lat = at->lat;
+        if (!crs.Area().Contains(*at)) outside.push_back(p.name);
+    }
+    for (auto path = survey.paths.begin(); path != survey.paths.end();) {
+        bool all = true;
+        for (auto& part : path->parts)
+            for (Vertex& v : part) {
+                const auto at = crs.ToWgs84(v.x, v.y);
+                all = all && at;
+                if (at) v.lon = at->lon, v.lat = at->lat;
+            }
+        if (all) {
+            ++path;
+            continue;
+        }
+        failed.push_back("path " + path->name);
+        path = survey.paths.erase(path);
+    }
+    // The first names are enough to find the fault; thousands would bury it.
+    auto names = [](const std::vector<std::string>& list) {
+        std::string text;
+        for (size_t i = 0; i < list.size() && i < 10; ++i) text += (i ? ", " : "") + list[i];
+        return list.size() > 10 ? text + " and " + std::to_string(list.size() - 10) + " more" : text;
+    };
+    if (!failed.empty())
+        Say(path, "PROJ cannot place in WGS 84: " + names(failed) + "; written without a position");
+    if (!outside.empty())
+        Say(path, "outside the area of use of " + survey.crs + ": " + names(outside) + "; written all the same");
+}
+
+int Export(const std::string& path, const std::string& format, const std::string& output,
+           const std::string& crsName) {
     CCarnet& book = FreshBook();
     int rejected = 0;
     const int status = LoadBook(path, book, rejected, true);
     if (status != kOk && (status != kRejected || rejected == 0)) return status;
-    const Survey survey = Gather(book, path);
+    Survey survey = Gather(book, path);
     if (survey.points.empty() && survey.paths.empty()) Say(path, "no point has known coordinates");
+    const bool geographic = format == "geojson" || format == "kml" || format == "gpx";
+    if (geographic) {
+        carnet::survey::Crs crs;
+        if (OpenCrs(book, path, crsName, crs) != kOk) {
+            Say(path, "nothing written");
+            return kUnreadable;
+        }
+        if (crs.IsLocal()) {
+            Say(path, "the book's coordinates are on a local grid (projection \"" +
+                          carnet::survey::ProjectionName(book) + "\"), and " + format +
+                          " holds longitudes and latitudes: give --crs with the system they are in, such as "
+                          "--crs EPSG:2154; nothing written");
+            return kUnreadable;
+        }
+        Place(survey, crs, path);
+    }
     const int written = WriteOutput(output, [&](std::FILE* f) {
         // dxflib opens a file of its own: the one under the stream.
         if (format == "dxf") return WriteDxf(survey, "/proc/self/fd/" + std::to_string(fileno(f)));
-        return format == "csv"       ? WriteCsv(survey, f)
-               : format == "geojson" ? WriteGeoJson(survey, f)
-                                     : WriteSvg(survey, f);
+        if (format == "csv") return WriteCsv(survey, f);
+        if (format == "geojson") return WriteGeoJson(survey, f);
+        if (format == "kml") return WriteKml(survey, f);
+        if (format == "gpx") return WriteGpx(survey, f);
+        return WriteSvg(survey, f);
     });
     return std::max(status, written);
 }

@@ -1,10 +1,15 @@
 // What an export carries: the points with known coordinates and the traverse
-// paths drawn through the points of their stations.
+// paths drawn through the points of their stations, in the book's metres and,
+// for the exports that want them, in WGS 84 longitude and latitude.
 #pragma once
 
 #include <cstdio>
 #include <string>
 #include <vector>
+
+#include <carnet/survey/crs.h>
+
+class CCarnet;
 
 namespace carnet_tool {
 
@@ -14,11 +19,14 @@ struct ExportPoint {
     double x, y, z;    // UNDEF_VALUE when not known
     int locks;         // 1 planimetric, 2 altimetric, 3 both
     bool station;      // a station is set up on it
+    bool placed = false;  // lon and lat hold its WGS 84 position
+    double lon = 0, lat = 0;
     bool HasXY() const;
 };
 
 struct Vertex {
     double x, y;
+    double lon = 0, lat = 0;  // WGS 84, when the survey is placed
 };
 
 struct ExportPath {
@@ -31,6 +39,8 @@ struct ExportPath {
 struct Survey {
     std::string title;       // the book's file name
     std::string projection;  // empty when none is declared
+    std::string crs;         // the system converted from ("EPSG:27572"), when placed
+    std::string crsName;     // PROJ's name of it, code page 1252
     std::vector<ExportPoint> points;
     std::vector<ExportPath> paths;
     // The plan extent of what is drawn; false when nothing has a plan position.
@@ -39,9 +49,19 @@ struct Survey {
 
 // Each writes the survey whole and says whether all was written.
 bool WriteCsv(const Survey& survey, std::FILE* f);
+// In WGS 84: RFC 7946 GeoJSON, KML 2.2 and GPX 1.1.
 bool WriteGeoJson(const Survey& survey, std::FILE* f);
+bool WriteKml(const Survey& survey, std::FILE* f);
+bool WriteGpx(const Survey& survey, std::FILE* f);
 bool WriteSvg(const Survey& survey, std::FILE* f);
 // Through dxflib, to a file of its own.
 bool WriteDxf(const Survey& survey, const std::string& path);
+
+// PROJ's UTF-8 text as code page 1252 (what it cannot hold becomes '?').
+std::string FromProj(const std::string& utf8);
+
+// The system of a book, or the one --crs names when not empty; warnings said.
+// kOk, or kUnreadable with the error said.
+int OpenCrs(const CCarnet& book, const std::string& path, const std::string& crsName, carnet::survey::Crs& crs);
 
 }  // namespace carnet_tool

@@ -1,4 +1,4 @@
-// The survey as a DXF drawing (AutoCAD 2000 format) through dxflib: each
+// The survey as a DXF drawing (format version AC1015) through dxflib: each
 // point on the layer of its code with its name as a text beside it, the
 // paths as polylines on a layer of their own. Texts stay code page 1252, as
 // the drawing's code page says.

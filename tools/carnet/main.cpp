@@ -126,7 +126,7 @@ int Run(int argc, char** argv) {
         ->capture_default_str();
 
     std::vector<std::string> files;
-    std::string file, type, name, text, target, params, format;
+    std::string file, type, name, text, target, params, format, crs;
     bool numbers = false, json = false, backup = false, list = false;
     int version = CCode::CurrentVersion, decimals = 0;
     std::string sep = "/";
@@ -187,9 +187,12 @@ int Run(int argc, char** argv) {
                         "A profile file, or a registry key such as HKEY_CURRENT_USER\\Software\\Carnet; the "
                         "defaults without it");
 
-    CLI::App* projection = Subcommand(app, "projection", "Print the projection a book declares",
+    CLI::App* projection = Subcommand(app, "projection",
+                                      "The book's coordinate system: its name, area of use, and the scale factor "
+                                      "at the book's mean position",
                                       "carnet projection chantier.geo");
     projection->add_option("file", file, "Field-book file")->required();
+    projection->add_option("--crs", crs, "A system PROJ knows, such as EPSG:2154, instead of the book's");
 
     CLI::App* formatting = Subcommand(app, "format",
                                       "Load a book and save it again in the standard layout, its options first",
@@ -205,10 +208,14 @@ int Run(int argc, char** argv) {
                                      "The points with known coordinates and the traverse paths, for other programs",
                                      "carnet export chantier.geo --to geojson -o chantier.geojson");
     exporting->add_option("file", file, "Field-book file")->required();
-    exporting->add_option("--to", format, "csv (points), geojson, dxf or svg (an A4 plot)")
+    exporting->add_option("--to", format,
+                          "csv (points), dxf or svg (an A4 plot) in the book's metres; geojson, kml (globe viewers) "
+                          "or gpx (handheld receivers) in WGS 84")
         ->required()
-        ->check(CLI::IsMember({"csv", "geojson", "dxf", "svg"}));
+        ->check(CLI::IsMember({"csv", "geojson", "kml", "gpx", "dxf", "svg"}));
     exporting->add_option("-o,--output", target, "Write here instead of standard output");
+    exporting->add_option("--crs", crs,
+                          "The system the book's coordinates are in, such as EPSG:2154, instead of its projection");
 
     try {
         app.parse(argc, argv);
@@ -247,8 +254,8 @@ int Run(int argc, char** argv) {
         return Interpret(name, text, sep, decimals);
     }
     if (options->parsed()) return Options(params);
-    if (projection->parsed()) return ShowProjection(file);
-    if (exporting->parsed()) return Export(file, format, target);
+    if (projection->parsed()) return ShowProjection(file, crs);
+    if (exporting->parsed()) return Export(file, format, target, crs);
     return Format(file, target, backup, params);
 }
 

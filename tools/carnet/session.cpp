@@ -114,6 +114,11 @@ bool FromTerminal(const std::string& what, const std::string& arg, std::string& 
     return false;
 }
 
+void Put(const std::string& cp1252) {
+    const std::string text = ForOutput(cp1252, CurrentSession().output);
+    std::fwrite(text.data(), 1, text.size(), stdout);
+}
+
 int LoadBook(const std::string& path, CCarnet& book, int& rejected, bool keepOptions) {
     rejected = 0;
     Session& session = CurrentSession();

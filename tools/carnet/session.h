@@ -48,6 +48,9 @@ void Say(const std::string& context, std::string_view text, std::string_view sho
 
 std::string Plural(long n, const char* word);
 
+// Shows a code page 1252 text on standard output, in the output encoding.
+void Put(const std::string& cp1252);
+
 // A book or a table read once, as code page 1252: the file's own bytes, or
 // their conversion from UTF-8 when the input encoding says so.
 class Input {
