@@ -123,17 +123,3 @@ const CarnetElementType* CarnetTypeInfo(unsigned int code);
 // The written keyword of a type code ("CheminAntenne" and "ExcentRad" for the
 // types whose keyword depends on the record), or null outside the table.
 const char* CarnetKeyword(unsigned int code);
-
-// The type code of an element class, from the table: TypeCode<CPointGen> is
-// the code that typAt gives for a point.
-template <class T>
-struct ElementTypeCode;
-#define CARNET_ELEMENT_TYPE_CODE(code, cls, ...) \
-    template <>                                  \
-    struct ElementTypeCode<cls> {                \
-        static constexpr unsigned int value = code; \
-    };
-CARNET_ELEMENT_TYPES(CARNET_ELEMENT_TYPE_CODE)
-#undef CARNET_ELEMENT_TYPE_CODE
-template <class T>
-constexpr unsigned int TypeCode = ElementTypeCode<T>::value;

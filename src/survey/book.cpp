@@ -20,7 +20,7 @@ std::optional<MeanPosition> MeanOfKnownPoints(const CCarnet& book) {
     MeanPosition mean;
     double x0 = 0, y0 = 0, dx = 0, dy = 0;
     for (int i = 0; i < book.length(); ++i) {
-        if (book.typAt(i) != TypeCode<CPointGen>) continue;
+        if (book.typAt(i) != TypeCode<CPointGen>::value) continue;
         const auto& p = *static_cast<const CPointGen*>(book.ptrAt(i));
         if (!p.hasXY()) continue;
         if (mean.count == 0) {

@@ -274,9 +274,9 @@ const Case kCases[] = {
      {},
      0,
      " 5  Point      S2  calcul\xE9  X =  601404.5710 , Y = 2428836.1800\n"
-     "13  Reference  S2  clou     HP =   1.3000 , AH = 112.45710 , AV =  99.87120 , DI = 184.2310\n"
+     "13  Reference  S2  clou     HP =   1.3000 , AH =  51.41236 , AV =  99.69610 , DI = 184.1383\n"
      "22  Station    S2           HI =   1.5480\n"
-     "28  Reference  S2  clou     HP =   1.3000 , AH = 278.33020 , AV =  99.77900 , DI = 152.6640\n"
+     "28  Reference  S2  clou     HP =   1.3000 , AH = 260.58601 , AV = 100.33488 , DI = 152.5894\n"
      "42  NivLectAV  S2  borne                   LM =  0.3652 , DH =  37.9500\n"
      "S2: X 601404.571000  Y 2428836.180000\n",
      "",
@@ -297,7 +297,7 @@ const Case kCases[] = {
      "18  Mesure     103  regard EU     HP =   2.0000 , AH = 260.10450 , AV =  98.44000 , DI =  22.9050\n"
      "20  Mesure     104  poteau b\xE9ton  HP =   1.3000 , AH = 288.90200 , AV = 100.88100 , DI =  30.7770\n"
      "25  Mesure     105  bordure       HP =   1.3000 , AH =  45.11800 , AV = 100.02100 , DI =  28.4500\n"
-     "30  Reference  S4   piquet        HP =   1.3000 , AH =  12.66500 , AV = 100.51200 , DI =  96.3305\n"
+     "30  Reference  S4   piquet        HP =   1.3000 , AH =  55.41468 , AV = 100.38049 , DI =  96.2789\n"
      "32  Station    S4                 HI =   1.5770\n",
      "",
      {}},
@@ -409,26 +409,53 @@ const Case kCases[] = {
     {"an export names the points outside the system's area of use and keeps them",
      "export $W/p.geo --to gpx --crs EPSG:2154", {{"p.geo", kLambert93}}, 0,
      "...\n<wpt lat=\"46.500000000\" lon=\"3.000000000\"><ele>100.000000</ele><name>A</name><desc>borne</desc>"
-     "</wpt>\n<wpt lat=\"32.216383772\" lon=\"3.000000000\"><name>B</name><desc>borne</desc></wpt>\n</gpx>\n",
+     "<src>known</src></wpt>\n<wpt lat=\"32.216383772\" lon=\"3.000000000\"><name>B</name><desc>borne</desc>"
+     "<src>known</src></wpt>\n</gpx>\n",
      "$W/p.geo: outside the area of use of EPSG:2154: B; written all the same\n", {}},
+    {"compute the example: a computation sheet within tolerances", "compute $EX", {}, 0,
+     "Computation of $EX\n"
+     "Distances: scale +52.9 cm/km, level -2.4 cm/km, factor 1.00050490 (computed: scale of EPSG:27572 at the "
+     "stored mean position, level reduction from the mean height)\n"
+     "Tolerances: angles 0.00500 gr, distances 0.0100 m, heights 0.0200 m\n\n"
+     "Set-up S1 (line 11): known point (line 4)  X 601234.5120  Y 2428765.3310  Z 151.8740  HI 1.5620\n"
+     "  V0 23.45651 gr, mean of 2 references weighted by distance\n"
+     "  reference       distance m        V0 gr     dev. gr   offset m\n"
+     "  R100             700.5405     23.45630    -0.00021    -0.0023\n"
+     "  S2               184.2272     23.45730     0.00079     0.0023\n"
+     "  5 points computed\n...\n"
+     "4 set-ups, 16 observations computed, 0 left out, 0 checks above tolerance\n",
+     "", {}},
+    {"compute says what it leaves out, and why", "compute $W/b.geo",
+     {{"b.geo", "Point A 0 0.0 0.0 0.0 a\nStation A 1.0\nMesure X 1.0 10.0 100.0 5.0 x\n"}}, 1,
+     "...\n  unoriented: no reference to a point with coordinates, no V0\n  0 points computed\n\nLeft out\n"
+     "  line 3       X            the set-up on A is unoriented\n\n"
+     "1 set-up, 0 observations computed, 1 left out, 0 checks above tolerance\n", "", {}},
+    {"compute writes the points and the shots as CSV", "compute $W/s.geo --points $W/p.csv --shots $W/s.csv",
+     {{"s.geo", "Option_Correc 0 0.0 0.0 0 0 0 6366\nPoint A 0 0.0 0.0 0.0 a\nStation A 1.0 0.0\n"
+                "Mesure P 1.0 100.0 100.0 10.0 p\n"}}, 0, "...\n", "",
+     {{"p.csv", "name,x,y,z,code,source\nA,0.0000,0.0000,0.0000,a,known\nP,10.0000,0.0000,0.0000,p,radiated\n"},
+      {"s.csv", "station,name,x,y,z,code,element\nA,P,10.0000,0.0000,0.0000,p,3\n"}}},
     {"export of the points as CSV",
      "export $EX --to csv",
      {},
      0,
-     "name,x,y,z,code,locks\n"
-     "S1,601234.512000,2428765.331000,151.874000,borne OGE,3\n"
-     "S2,601404.571000,2428836.180000,,calcul\xC3\xA9,0\n"
-     "S3,601319.484000,2428962.936000,153.518000,borne OGE,3\n"
-     "S4,601259.484000,2429038.296000,,calcul\xC3\xA9,0\n"
-     "R100,601890.000000,2429012.500000,,clocher,1\n"
-     "NGF12,,,150.412000,rep\xC3\xA8re NGF,2\n",
+     "name,x,y,z,code,locks,source\n"
+     "S1,601234.512000,2428765.331000,151.874000,borne OGE,3,known\n"
+     "S2,601404.570737,2428836.181212,153.020809,calcul\xC3\xA9,0,computed\n"
+     "S3,601319.484000,2428962.936000,153.518000,borne OGE,3,known\n"
+     "S4,601259.484826,2429038.295124,153.246014,calcul\xC3\xA9,0,computed\n"
+     "R100,601890.000000,2429012.500000,,clocher,1,known\n"
+     "NGF12,,,150.412000,rep\xC3\xA8re NGF,2,known\n"
+     "101,601221.120307,2428732.530300,151.905911,angle b\xC3\xA2ti,0,computed\n"
+     "...\n"
+     "109,601237.838547,2429015.251375,153.032129,haie,0,computed\n",
      "",
      {}},
     {"export quotes CSV fields and breaks a path at a station without position",
      "export $W/q.geo --to csv",
      {{"q.geo", "Point P1 1.0 2.0 a,\"b\"\nStation P1 1.5\nStation P2 1.5\nCheminAntenne C P1-1 P2-1\n"}},
      0,
-     "name,x,y,z,code,locks\nP1,1.000000,2.000000,,\"a,\"\"b\"\"\",0\n",
+     "name,x,y,z,code,locks,source\nP1,1.000000,2.000000,,\"a,\"\"b\"\"\",0,known\n",
      "$W/q.geo: path C: no plan position for P2; not drawn\n",
      {}},
     {"format reproduces the example", "format $W/c.geo", {{"c.geo", Example()}}, 0, "", "", {{"c.geo", Example()}}},
@@ -537,7 +564,7 @@ TEST_F(Tool, CommandLines) {
 
 TEST_F(Tool, EverySubcommandHelpHasAnExample) {
     for (const char* sub : {"check", "list", "show", "find", "next", "select", "codes", "interpret", "options",
-                            "projection", "format", "export"}) {
+                            "projection", "format", "compute", "export"}) {
         SCOPED_TRACE(sub);
         const Outcome run = Carnet(std::string(sub) + " --help");
         EXPECT_EQ(run.status, 0);
@@ -551,6 +578,17 @@ TEST_F(Tool, ExportsOpenInTheirReaders) {
     for (const char* format : {"geojson", "kml", "gpx", "dxf", "svg"})
         ASSERT_EQ(Carnet("export $EX --to " + std::string(format) + " -o $W/c." + format).status, 0) << format;
 
+    // The computation as JSON, read by Python's.
+    const Outcome json = Carnet("compute $EX --json");
+    EXPECT_EQ(json.status, 0);
+    WriteFile(Path("work/c.json"), json.out);
+    EXPECT_EQ(Python("import json, sys\n"
+                     "d = json.load(open(sys.argv[1], encoding='utf-8'))\n"
+                     "print(len(d['setups']), len(d['shots']), len(d['points']), d['clean'],\n"
+                     "      [p['source'] for p in d['points'] if p['name'] in ('S1', 'S2', '101')])\n",
+                     Path("work/c.json")),
+              "4 16 15 True ['known', 'mean', 'radiated']\n");
+
     // GeoJSON as RFC 7946 has it: longitude, latitude and height; the book's
     // own coordinates and its system beside them.
     EXPECT_EQ(Python("import json, sys\n"
@@ -560,35 +598,50 @@ TEST_F(Tool, ExportsOpenInTheirReaders) {
                      "    g = f['geometry']\n"
                      "    p = f['properties']\n"
                      "    print(g and g['type'], g and len(g['coordinates']), p['name'], p.get('code'),\n"
-                     "          p.get('x'), p.get('y'), p.get('z'), p.get('locks'), p.get('station'), p.get('kind'),\n"
-                     "          p.get('stations'))\n",
+                     "          p.get('x'), p.get('y'), p.get('z'), p.get('locks'), p.get('station'), p.get('source'),\n"
+                     "          p.get('kind'),"
+                     " p.get('stations'))\n",
                      Path("work/c.geojson")),
               "FeatureCollection chantier.geo Projection Lambert Zone II EPSG:27572 NTF (Paris) / Lambert zone II\n"
-              "Point 3 S1 borne OGE 601234.512 2428765.331 151.874 3 True None None\n"
-              "Point 2 S2 calcul\xC3\xA9 601404.571 2428836.18 None 0 True None None\n"
-              "Point 3 S3 borne OGE 601319.484 2428962.936 153.518 3 True None None\n"
-              "Point 2 S4 calcul\xC3\xA9 601259.484 2429038.296 None 0 True None None\n"
-              "Point 2 R100 clocher 601890.0 2429012.5 None 1 False None None\n"
-              "None None NGF12 rep\xC3\xA8re NGF None None 150.412 2 False None None\n"
-              "LineString 3 C1 None None None None None None framed ['S1-1', 'S2-1', 'S3-1']\n"
-              "LineString 2 C2 None None None None None None antenna ['S3-1', 'S4-1']\n");
+              "Point 3 S1 borne OGE 601234.512 2428765.331 151.874 3 True known None None\n"
+              "Point 3 S2 calcul\xC3\xA9 601404.570737 2428836.181212 153.020809 0 True computed None None\n"
+              "Point 3 S3 borne OGE 601319.484 2428962.936 153.518 3 True known None None\n"
+              "Point 3 S4 calcul\xC3\xA9 601259.484826 2429038.295124 153.246014 0 True computed None None\n"
+              "Point 2 R100 clocher 601890.0 2429012.5 None 1 False known None None\n"
+              "None None NGF12 rep\xC3\xA8re NGF None None 150.412 2 False known None None\n"
+              "Point 3 101 angle b\xC3\xA2ti 601221.120307 2428732.5303 151.905911 0 False computed None None\n"
+              "Point 3 102 arbre 601203.023947 2428738.631854 151.489616 0 False computed None None\n"
+              "Point 3 103 regard EU 601212.425731 2428759.239007 151.997685 0 False computed None None\n"
+              "Point 3 104 poteau b\xC3\xA9ton 601204.300739 2428771.270622 151.760744 0 False computed None None\n"
+              "Point 3 105 bordure 601420.070843 2428812.305854 153.260016 0 False computed None None\n"
+              "Point 3 106 bordure 601415.242232 2428804.808562 153.276272 0 False computed None None\n"
+              "Point 3 107 avaloir 601301.323739 2428957.659905 153.461745 0 False computed None None\n"
+              "Point 3 108 arbre 601249.401288 2429016.373665 153.398112 0 False computed None None\n"
+              "Point 3 109 haie 601237.838547 2429015.251375 153.032129 0 False computed None None\n"
+              "LineString 3 C1 None None None None None None None framed ['S1-1', 'S2-1', 'S3-1']\n"
+              "LineString 2 C2 None None None None None None None antenna ['S3-1', 'S4-1']\n");
 
-    // GDAL reads each of the three where PROJ's cs2cs puts the book's points.
-    const std::vector<std::pair<std::string, std::vector<const char*>>> placed = {
-        {"S1", {"601234.512 2428765.331"}}, {"S2", {"601404.571 2428836.18"}},
-        {"S3", {"601319.484 2428962.936"}}, {"S4", {"601259.484 2429038.296"}},
-        {"R100", {"601890.0 2429012.5"}},
-        {"C1", {"601234.512 2428765.331", "601404.571 2428836.18", "601319.484 2428962.936"}},
-        {"C2", {"601319.484 2428962.936", "601259.484 2429038.296"}}};
+    // GDAL reads each of the three where PROJ's cs2cs puts the points of the
+    // CSV export, and the paths through their stations.
+    ASSERT_EQ(Carnet("export $EX --to csv -o $W/c.csv").status, 0);
+    std::map<std::string, std::string> grid;  // name -> "x y"
+    for (const std::string& row : Lines(ReadFile(Path("work/c.csv")))) {
+        const std::vector<double> n = Numbers(row.substr(row.find(',')));
+        if (row.rfind("name,", 0) != 0 && row.find(",,,") == std::string::npos)
+            grid[row.substr(0, row.find(','))] = std::to_string(n.at(0)) + " " + std::to_string(n.at(1));
+    }
+    std::map<std::string, std::vector<std::string>> placed = {{"C1", {"S1", "S2", "S3"}}, {"C2", {"S3", "S4"}}};
+    for (const auto& [name, xy] : grid) placed[name] = {name};
     std::map<std::string, std::vector<double>> expected;
-    for (const auto& [name, grid] : placed)
-        for (const char* xy : grid) {
+    for (const auto& [name, stations] : placed)
+        for (const std::string& station : stations) {
             const std::vector<double> latLon =
-                Numbers(Shell("echo " + std::string(xy) + " | cs2cs -f %.10f EPSG:27572 EPSG:4326"));
-            ASSERT_GE(latLon.size(), 2u) << xy;
+                Numbers(Shell("echo " + grid.at(station) + " | cs2cs -f %.10f EPSG:27572 EPSG:4326"));
+            ASSERT_GE(latLon.size(), 2u) << station;
             expected[name].push_back(latLon[1]);
             expected[name].push_back(latLon[0]);
         }
+    ASSERT_EQ(expected.size(), 16u);
     for (const char* format : {"geojson", "kml", "gpx"}) {
         SCOPED_TRACE(format);
         const auto read = OgrPositions(Path(std::string("work/c.") + format));
@@ -611,15 +664,27 @@ TEST_F(Tool, ExportsOpenInTheirReaders) {
                      "for l in msp.query('LWPOLYLINE POLYLINE'):\n"
                      "    print('line', l.dxf.layer, [tuple(round(c, 3) for c in v[:2]) for v in l.get_points()])\n",
                      Path("work/c.dxf")),
-              "['0', 'CHEMINS', 'Defpoints', 'borne OGE', 'calcul\xC3\xA9', 'clocher']\n"
+              "['0', 'CHEMINS', 'Defpoints', 'angle b\xC3\xA2ti', 'arbre', 'avaloir', 'bordure', 'borne OGE', "
+              "'calcul\xC3\xA9', 'clocher', 'haie', 'poteau b\xC3\xA9ton', 'regard EU']\n"
               "point borne OGE (601234.512, 2428765.331, 151.874)\n"
-              "point calcul\xC3\xA9 (601404.571, 2428836.18, 0.0)\n"
+              "point calcul\xC3\xA9 (601404.571, 2428836.181, 153.021)\n"
               "point borne OGE (601319.484, 2428962.936, 153.518)\n"
-              "point calcul\xC3\xA9 (601259.484, 2429038.296, 0.0)\n"
+              "point calcul\xC3\xA9 (601259.485, 2429038.295, 153.246)\n"
               "point clocher (601890.0, 2429012.5, 0.0)\n"
+              "point angle b\xC3\xA2ti (601221.12, 2428732.53, 151.906)\n"
+              "point arbre (601203.024, 2428738.632, 151.49)\n"
+              "point regard EU (601212.426, 2428759.239, 151.998)\n"
+              "point poteau b\xC3\xA9ton (601204.301, 2428771.271, 151.761)\n"
+              "point bordure (601420.071, 2428812.306, 153.26)\n"
+              "point bordure (601415.242, 2428804.809, 153.276)\n"
+              "point avaloir (601301.324, 2428957.66, 153.462)\n"
+              "point arbre (601249.401, 2429016.374, 153.398)\n"
+              "point haie (601237.839, 2429015.251, 153.032)\n"
               "text borne OGE S1\ntext calcul\xC3\xA9 S2\ntext borne OGE S3\ntext calcul\xC3\xA9 S4\ntext clocher R100\n"
-              "line CHEMINS [(601234.512, 2428765.331), (601404.571, 2428836.18), (601319.484, 2428962.936)]\n"
-              "line CHEMINS [(601319.484, 2428962.936), (601259.484, 2429038.296)]\n");
+              "text angle b\xC3\xA2ti 101\ntext arbre 102\ntext regard EU 103\ntext poteau b\xC3\xA9ton 104\n"
+              "text bordure 105\ntext bordure 106\ntext avaloir 107\ntext arbre 108\ntext haie 109\n"
+              "line CHEMINS [(601234.512, 2428765.331), (601404.571, 2428836.181), (601319.484, 2428962.936)]\n"
+              "line CHEMINS [(601319.484, 2428962.936), (601259.485, 2429038.295)]\n");
 
     // The plot: every mark inside the page, north up (S3 lies north of S1),
     // the scale bar's length as drawn matching its label.
@@ -643,7 +708,8 @@ TEST_F(Tool, ExportsOpenInTheirReaders) {
                      "print(round(page / (width / metres), 1))\n",
                      Path("work/c.svg")),
               "0 0 297 210 chantier.geo \xE2\x80\x94 Projection Lambert Zone II\n"
-              "['R100', 'S1', 'S2', 'S3', 'S4'] True\nTrue True\n4 1 2\n215.1\n");
+              "['101', '102', '103', '104', '105', '106', '107', '108', '109', 'R100', 'S1', 'S2', 'S3', 'S4'] True\n"
+              "True True\n4 10 2\n215.1\n");
 }
 
 // A large generated book goes through the reading and writing commands.
@@ -680,13 +746,14 @@ TEST_F(Tool, LargeGeneratedBook) {
         EXPECT_EQ(run.status, 0) << format << run.err;
         EXPECT_EQ(run.err, "") << format;
     }
-    EXPECT_EQ(Lines(ReadFile(Path("work/big.csv"))).size(), static_cast<size_t>(kStations + 1));
+    // Each station's known point and the six points it measures.
+    EXPECT_EQ(Lines(ReadFile(Path("work/big.csv"))).size(), static_cast<size_t>(7 * kStations + 1));
     EXPECT_EQ(Python("import json, sys\n"
                      "d = json.load(open(sys.argv[1]))\n"
                      "print(sum(f['geometry']['type'] == 'Point' for f in d['features']),\n"
                      "      sum(f['geometry']['type'] == 'LineString' for f in d['features']))\n",
                      Path("work/big.geojson")),
-              "20000 20000\n");
+              "140000 20000\n");
     const std::string dxf = ReadFile(Path("work/big.dxf"));
     EXPECT_EQ(dxf.substr(dxf.size() - 4), "EOF\n");
 }

@@ -29,6 +29,9 @@ int ListDrawingKeywords();
 int Export(const std::string& path, const std::string& format, const std::string& output,
            const std::string& crs);
 
+// compute.cpp
+int Compute(const std::string& path, bool json, const std::string& pointsCsv, const std::string& shotsCsv);
+
 // projection.cpp
 int ShowProjection(const std::string& path, const std::string& crs);
 

@@ -8,6 +8,7 @@
 
 #include <carnet/carnet.h>
 #include <carnet/survey/book.h>
+#include <carnet/survey/compute.h>
 
 #include "commands.h"
 #include "elements.h"
@@ -16,21 +17,7 @@
 namespace carnet_tool {
 namespace {
 
-const unsigned int kStation = TypeCode<CStation>::value, kPoint = TypeCode<CPointGen>::value,
-                   kPath = TypeCode<CChemin>::value;
-
 std::string Number(double v) { return numconv::Format("%.6f", v); }
-
-// A CSV field, quoted when it holds a separator, a quote or a line break.
-std::string CsvField(const std::string& cp1252) {
-    const std::string text = Utf8Of(cp1252);
-    if (text.find_first_of(",\"\r\n") == std::string::npos) return text;
-    std::string quoted = "\"";
-    for (char ch : text) quoted += ch == '"' ? std::string("\"\"") : std::string(1, ch);
-    return quoted + "\"";
-}
-
-bool Puts(std::FILE* f, const std::string& text) { return std::fwrite(text.data(), 1, text.size(), f) == text.size(); }
 
 std::string JsonNumber(double v) { return IsUndef(v) ? std::string("null") : Number(v); }
 
@@ -62,50 +49,72 @@ Survey Gather(CCarnet& book, const std::string& path) {
     const std::string projection = carnet::survey::ProjectionName(book);
     if (projection != "Aucune") survey.projection = projection;
 
-    // The first point of each number, as the book's lookups find it, and
-    // the numbers that stations are set up on: one pass, not one per query.
+    // The coordinates the observations give, beside the known ones.
+    const carnet::survey::Computation computed = carnet::survey::Compute(book);
+    for (const std::string& note : computed.notes) Say(path, note);
+    if (!computed.leftOut.empty())
+        Say(path, Plural(static_cast<long>(computed.leftOut.size()), "observation") +
+                      " left out of the computation; carnet compute tells why");
+
+    // The numbers that stations are set up on, and the locks of the first
+    // point of each number: one pass, not one per query.
     std::set<std::string> stations;
-    std::unordered_map<std::string, const CPointGen*> firstPoint;
+    std::unordered_map<std::string, int> locks;
     for (int i = 0; i < book.length(); ++i) {
-        if (book.typAt(i) == kStation) stations.insert(book.matAt(i).str());
-        if (book.typAt(i) == kPoint) {
+        if (book.typAt(i) == TypeCode<CStation>::value) stations.insert(book.matAt(i).str());
+        if (book.typAt(i) == TypeCode<CPointGen>::value) {
             const CPointGen* p = static_cast<const CPointGen*>(book.ptrAt(i));
-            firstPoint.emplace(p->m_Np.str(), p);
+            locks.emplace(p->m_Np.str(), p->LockCode());
         }
     }
+    std::unordered_map<std::string, const carnet::survey::ComputedPoint*> byName;
+    for (const carnet::survey::ComputedPoint& p : computed.points) {
+        byName.emplace(p.name, &p);
+        if (!p.x && !p.z) continue;
+        const auto lock = locks.find(p.name);
+        ExportPoint point{p.name, p.code, p.x.value_or(UNDEF_VALUE), p.y.value_or(UNDEF_VALUE),
+                          p.z.value_or(UNDEF_VALUE), lock == locks.end() ? 0 : lock->second,
+                          stations.count(p.name) > 0};
+        point.source = p.source == carnet::survey::PointSource::Known ? "known" : "computed";
+        survey.points.push_back(std::move(point));
+    }
     for (int i = 0; i < book.length(); ++i) {
-        if (book.typAt(i) == kPoint) {
-            const CPointGen& p = *static_cast<const CPointGen*>(book.ptrAt(i));
-            if (p.hasXY() || p.hasZ())
-                survey.points.push_back({p.m_Np.str(), p.m_Sy.str(), p.m_X, p.m_Y, p.m_Z, p.LockCode(),
-                                         stations.count(p.m_Np.str()) > 0});
-        } else if (book.typAt(i) == kPath) {
-            const CChemin& c = *static_cast<const CChemin*>(book.ptrAt(i));
-            ExportPath line{c.Np().str(), c.isAntenne() != 0, {}, {{}}};
-            std::string missing;
-            for (int k = 0; k < c.length(); ++k) {
-                line.stations.push_back(numconv::Format("%s-%d", c.matAt(k).GetString(), c.repAt(k)));
-                const auto found = firstPoint.find(c.matAt(k).str());
-                if (found != firstPoint.end() && found->second->hasXY()) {
-                    line.parts.back().push_back({found->second->m_X, found->second->m_Y});
-                    continue;
-                }
-                missing += (missing.empty() ? "" : ", ") + c.matAt(k).str();
-                line.parts.push_back({});
+        if (book.typAt(i) != TypeCode<CChemin>::value) continue;
+        const CChemin& c = *static_cast<const CChemin*>(book.ptrAt(i));
+        ExportPath line{c.Np().str(), c.isAntenne() != 0, {}, {{}}};
+        std::string missing;
+        for (int k = 0; k < c.length(); ++k) {
+            line.stations.push_back(numconv::Format("%s-%d", c.matAt(k).GetString(), c.repAt(k)));
+            const auto found = byName.find(c.matAt(k).str());
+            if (found != byName.end() && found->second->x) {
+                line.parts.back().push_back({*found->second->x, *found->second->y});
+                continue;
             }
-            line.parts.erase(std::remove_if(line.parts.begin(), line.parts.end(),
-                                            [](const std::vector<Vertex>& part) { return part.size() < 2; }),
-                             line.parts.end());
-            if (!missing.empty())
-                Say(path, "path " + line.name + ": no plan position for " + missing +
-                              (line.parts.empty() ? "; not drawn" : "; the line is broken there"));
-            if (!line.parts.empty()) survey.paths.push_back(std::move(line));
+            missing += (missing.empty() ? "" : ", ") + c.matAt(k).str();
+            line.parts.push_back({});
         }
+        line.parts.erase(std::remove_if(line.parts.begin(), line.parts.end(),
+                                        [](const std::vector<Vertex>& part) { return part.size() < 2; }),
+                         line.parts.end());
+        if (!missing.empty())
+            Say(path, "path " + line.name + ": no plan position for " + missing +
+                          (line.parts.empty() ? "; not drawn" : "; the line is broken there"));
+        if (!line.parts.empty()) survey.paths.push_back(std::move(line));
     }
     return survey;
 }
 
 }  // namespace
+
+std::string CsvField(const std::string& cp1252) {
+    const std::string text = Utf8Of(cp1252);
+    if (text.find_first_of(",\"\r\n") == std::string::npos) return text;
+    std::string quoted = "\"";
+    for (char ch : text) quoted += ch == '"' ? std::string("\"\"") : std::string(1, ch);
+    return quoted + "\"";
+}
+
+bool Puts(std::FILE* f, const std::string& text) { return std::fwrite(text.data(), 1, text.size(), f) == text.size(); }
 
 bool ExportPoint::HasXY() const { return !IsUndef(x) && !IsUndef(y); }
 
@@ -127,11 +136,11 @@ bool Survey::Extent(double& minX, double& minY, double& maxX, double& maxY) cons
 }
 
 bool WriteCsv(const Survey& survey, std::FILE* f) {
-    bool ok = Puts(f, "name,x,y,z,code,locks\n");
+    bool ok = Puts(f, "name,x,y,z,code,locks,source\n");
     auto value = [](double v) { return IsUndef(v) ? std::string() : Number(v); };
     for (const ExportPoint& p : survey.points)
         ok = Puts(f, CsvField(p.name) + "," + value(p.x) + "," + value(p.y) + "," + value(p.z) + "," +
-                         CsvField(p.code) + "," + std::to_string(p.locks) + "\n") &&
+                         CsvField(p.code) + "," + std::to_string(p.locks) + "," + p.source + "\n") &&
              ok;
     return ok;
 }
@@ -151,7 +160,8 @@ bool WriteGeoJson(const Survey& survey, std::FILE* f) {
                          ", \"properties\": {\"name\": " + JsonString(p.name) + ", \"code\": " + JsonString(p.code) +
                          ", \"x\": " + JsonNumber(p.x) + ", \"y\": " + JsonNumber(p.y) + ", \"z\": " +
                          JsonNumber(p.z) + ", \"locks\": " + std::to_string(p.locks) +
-                         ", \"station\": " + (p.station ? "true" : "false") + "}}") &&
+                         ", \"station\": " + (p.station ? "true" : "false") + ", \"source\": \"" + p.source +
+                         "\"}}") &&
              ok;
         separator = ",\n";
     }
@@ -219,11 +229,9 @@ int Export(const std::string& path, const std::string& format, const std::string
     int rejected = 0;
     const int status = LoadBook(path, book, rejected, true);
     if (status != kOk && (status != kRejected || rejected == 0)) return status;
-    Survey survey = Gather(book, path);
-    if (survey.points.empty() && survey.paths.empty()) Say(path, "no point has known coordinates");
     const bool geographic = format == "geojson" || format == "kml" || format == "gpx";
+    carnet::survey::Crs crs;
     if (geographic) {
-        carnet::survey::Crs crs;
         if (OpenCrs(book, path, crsName, crs) != kOk) {
             Say(path, "nothing written");
             return kUnreadable;
@@ -235,8 +243,10 @@ int Export(const std::string& path, const std::string& format, const std::string
                           "--crs EPSG:2154; nothing written");
             return kUnreadable;
         }
-        Place(survey, crs, path);
     }
+    Survey survey = Gather(book, path);
+    if (survey.points.empty() && survey.paths.empty()) Say(path, "no point has known coordinates");
+    if (geographic) Place(survey, crs, path);
     const int written = WriteOutput(output, [&](std::FILE* f) {
         // dxflib opens a file of its own: the one under the stream.
         if (format == "dxf") return WriteDxf(survey, "/proc/self/fd/" + std::to_string(fileno(f)));

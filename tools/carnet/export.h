@@ -19,6 +19,7 @@ struct ExportPoint {
     double x, y, z;    // UNDEF_VALUE when not known
     int locks;         // 1 planimetric, 2 altimetric, 3 both
     bool station;      // a station is set up on it
+    std::string source = "known";  // or "computed" from the observations
     bool placed = false;  // lon and lat hold its WGS 84 position
     double lon = 0, lat = 0;
     bool HasXY() const;
@@ -56,6 +57,11 @@ bool WriteGpx(const Survey& survey, std::FILE* f);
 bool WriteSvg(const Survey& survey, std::FILE* f);
 // Through dxflib, to a file of its own.
 bool WriteDxf(const Survey& survey, const std::string& path);
+
+// A CSV field in UTF-8, quoted when it holds a separator, a quote or a line break.
+std::string CsvField(const std::string& cp1252);
+// Writes the text; false when not all of it was written.
+bool Puts(std::FILE* f, const std::string& text);
 
 // PROJ's UTF-8 text as code page 1252 (what it cannot hold becomes '?').
 std::string FromProj(const std::string& utf8);

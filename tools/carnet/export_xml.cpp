@@ -8,8 +8,6 @@
 namespace carnet_tool {
 namespace {
 
-bool Puts(std::FILE* f, const std::string& text) { return std::fwrite(text.data(), 1, text.size(), f) == text.size(); }
-
 // A code page 1252 text as XML character data. The control characters that
 // XML 1.0 cannot hold at all become blanks.
 std::string Xml(const std::string& cp1252) {
@@ -61,7 +59,8 @@ bool WriteKml(const Survey& survey, std::FILE* f) {
                          "</description>\n<ExtendedData>" + KmlData("code", Xml(p.code)) + KmlData("x", Metres(p.x)) +
                          KmlData("y", Metres(p.y)) + KmlData("z", Metres(p.z)) +
                          KmlData("locks", std::to_string(p.locks)) +
-                         KmlData("station", p.station ? "true" : "false") + "</ExtendedData>\n<Point><coordinates>" +
+                         KmlData("station", p.station ? "true" : "false") + KmlData("source", p.source) +
+                         "</ExtendedData>\n<Point><coordinates>" +
                          Degrees(p.lon) + "," + Degrees(p.lat) + (IsUndef(p.z) ? "" : "," + Metres(p.z)) +
                          "</coordinates></Point></Placemark>\n") &&
              ok;
@@ -89,7 +88,7 @@ bool WriteGpx(const Survey& survey, std::FILE* f) {
         if (!p.placed) continue;
         ok = Puts(f, "<wpt lat=\"" + Degrees(p.lat) + "\" lon=\"" + Degrees(p.lon) + "\">" +
                          (IsUndef(p.z) ? std::string() : "<ele>" + Metres(p.z) + "</ele>") + "<name>" + Xml(p.name) +
-                         "</name><desc>" + Xml(p.code) + "</desc>" + (p.station ? "<type>station</type>" : "") +
+                         "</name><desc>" + Xml(p.code) + "</desc><src>" + p.source + "</src>" + (p.station ? "<type>station</type>" : "") +
                          "</wpt>\n") &&
              ok;
     }

@@ -50,6 +50,7 @@ const char kFooter[] =
     "  carnet options --params options.ini\n"
     "  carnet projection chantier.geo\n"
     "  carnet format --backup chantier.geo\n"
+    "  carnet compute chantier.geo\n"
     "  carnet export chantier.geo --to svg -o chantier.svg\n"
     "\n"
     "Exit status: 0 when all went well; 1 when lines of a book were rejected or\n"
@@ -126,7 +127,7 @@ int Run(int argc, char** argv) {
         ->capture_default_str();
 
     std::vector<std::string> files;
-    std::string file, type, name, text, target, params, format, crs;
+    std::string file, type, name, text, target, params, format, crs, shotsFile;
     bool numbers = false, json = false, backup = false, list = false;
     int version = CCode::CurrentVersion, decimals = 0;
     std::string sep = "/";
@@ -204,6 +205,15 @@ int Run(int argc, char** argv) {
                            "Write the options stored at this parameter location (a profile file or a registry "
                            "key) instead of the book's own");
 
+    CLI::App* computing = Subcommand(app, "compute",
+                                     "The coordinates of every observed point: set-ups, orientations, radiation, "
+                                     "with the checks against the book's tolerances",
+                                     "carnet compute chantier.geo --points points.csv");
+    computing->add_option("file", file, "Field-book file")->required();
+    computing->add_flag("--json", json, "The result as JSON");
+    computing->add_option("--points", target, "Write every point with coordinates here, as CSV");
+    computing->add_option("--shots", shotsFile, "Write every computed observation here, as CSV");
+
     CLI::App* exporting = Subcommand(app, "export",
                                      "The points with known coordinates and the traverse paths, for other programs",
                                      "carnet export chantier.geo --to geojson -o chantier.geojson");
@@ -255,6 +265,7 @@ int Run(int argc, char** argv) {
     }
     if (options->parsed()) return Options(params);
     if (projection->parsed()) return ShowProjection(file, crs);
+    if (computing->parsed()) return Compute(file, json, target, shotsFile);
     if (exporting->parsed()) return Export(file, format, target, crs);
     return Format(file, target, backup, params);
 }
