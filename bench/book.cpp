@@ -69,8 +69,14 @@ private:
         if (!m_stations.empty() && m_rng.Chance(10))
             name = m_stations[m_stations.size() - 1 - static_cast<size_t>(m_rng.Below(
                                                            static_cast<int>(std::min<size_t>(m_stations.size(), 30))))];
-        else
+        else {
+            // A new station is set up on a point of known coordinates, so that
+            // the computation has something to radiate from.
             name = Text("S%d", ++m_lastStation);
+            Add(new CPointGen(name.c_str(), m_rng.Uniform(1000.0, 9000.0), m_rng.Uniform(2000.0, 8000.0),
+                              m_rng.Uniform(20.0, 180.0), "station"),
+                TypeCode<CPointGen>::value);
+        }
         m_stations.push_back(name);
         Add(new CStation(name.c_str(), m_rng.Uniform(1.35, 1.75), m_rng.Uniform(0.0, 399.9), s % 3 ? "" : "borne"),
             1001);

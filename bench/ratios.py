@@ -22,6 +22,7 @@ RATIOS = (
     ("save / fprintf loop", "BM_Save", "BM_SaveFprintf", 1.5),
     ("write to a stream / fprintf loop", "BM_Write", "BM_SaveFprintf", 1.5),
     ("forward Find / fetching every measure", "BM_FindForward", "BM_TouchMeasures", None),
+    ("compute / load", "BM_Compute", "BM_Load", 3.0),
 )
 GROWTH = ("BM_Load", "BM_LoadMinimalParse", "BM_Save", "BM_Write", "BM_SaveFprintf", "BM_FindForward", "BM_TouchMeasures",
           "BM_FindBackward", "BM_HasPnt", "BM_LastMatPoints", "BM_LastMatAny")

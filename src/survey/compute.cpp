@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <string_view>
 #include <unordered_map>
 
 #include <carnet/ccarnet.h>
@@ -137,10 +138,20 @@ Corrections CorrectionsOf(const CCarnet& book, const Options& o, std::vector<std
 }
 
 // Running means of the determinations of each number, in book order.
-struct Accumulator {
+constexpr size_t kNone = static_cast<size_t>(-1);
+
+// What the computation knows of one point number: its Point lines (as
+// ranges of Computer::m_planLines and m_heightLines) and the running sums
+// of its determinations in book order.
+struct Entry {
+    int planBegin = 0, planEnd = 0, heightBegin = 0, heightEnd = 0;
     int plan = 0, height = 0;
     double sx = 0, sy = 0, sz = 0;
-    std::vector<size_t> shots;  // into Computation::shots
+    // Its shots, chained through Computer::m_nextShot: one list for the
+    // whole book rather than a vector for each of a million points.
+    size_t first = kNone, last = kNone;
+    bool computed = false;  // in m_computedOrder
+    int point = -1;         // its row in Computation::points
 };
 
 class Computer {
@@ -189,39 +200,83 @@ private:
     const CCarnet& m_book;
     Computation m_result;
     double m_factor = 1;
-    // Point lines with a plan position, and with a height, by number.
-    std::unordered_map<std::string, std::vector<int>> m_planLines, m_heightLines;
-    std::unordered_map<std::string, Accumulator> m_computed;
-    std::vector<std::string> m_computedOrder;
+    // The one index of the point numbers of the book: a number (viewed in
+    // the book's own text) to its entry.
+    std::unordered_map<std::string_view, int> m_ids;
+    std::vector<Entry> m_entries;
+    // The Point lines with a plan position, and with a height, grouped by
+    // number in book order.
+    std::vector<int> m_planLines, m_heightLines;
+    std::vector<size_t> m_nextShot;  // the next shot of the same number, or kNone
+    std::vector<int> m_computedOrder;  // entries, in the order first computed
     int m_current = -1;               // index into setUps of the set-up being read
     std::vector<int> m_observations;  // its observations
 
     const CPointGen& PointAt(int i) const { return *static_cast<const CPointGen*>(m_book.ptrAt(i)); }
     const CReference& ObservationAt(int i) const { return *static_cast<const CReference*>(m_book.ptrAt(i)); }
     std::string Name(int i) const { return ObservationAt(i).Np().str(); }
+    std::string_view NameView(int i) const { return ObservationAt(i).Np().str(); }
+
+    int Id(std::string_view name) {
+        const auto [at, fresh] = m_ids.try_emplace(name, static_cast<int>(m_entries.size()));
+        if (fresh) m_entries.emplace_back();
+        return at->second;
+    }
 
     void LeaveOut(int element, const std::string& name, const std::string& reason) {
         m_result.leftOut.push_back({element, name, reason});
     }
 
     void IndexKnownPoints() {
+        size_t observations = 0, points = 0;
+        for (int i = 0; i < m_book.length(); ++i) points += m_book.typAt(i) == TypeCode<CPointGen>::value;
+        m_ids.reserve(points);
+        m_entries.reserve(points);
+        for (int i = 0; i < m_book.length(); ++i) {
+            const unsigned int t = m_book.typAt(i);
+            observations += t == TypeCode<CReference>::value || t == TypeCode<CMesure>::value;
+            if (t != TypeCode<CPointGen>::value) continue;
+            const CPointGen& p = PointAt(i);
+            Entry& e = m_entries[Id(p.m_Np.str())];
+            e.planEnd += p.hasXY() ? 1 : 0;
+            e.heightEnd += p.hasZ() ? 1 : 0;
+        }
+        // Counts to ranges, then the lines in book order within each.
+        int plan = 0, height = 0;
+        for (Entry& e : m_entries) {
+            e.planBegin = plan;
+            plan += e.planEnd;
+            e.planEnd = e.planBegin;
+            e.heightBegin = height;
+            height += e.heightEnd;
+            e.heightEnd = e.heightBegin;
+        }
+        m_planLines.resize(plan);
+        m_heightLines.resize(height);
         for (int i = 0; i < m_book.length(); ++i) {
             if (m_book.typAt(i) != TypeCode<CPointGen>::value) continue;
             const CPointGen& p = PointAt(i);
-            if (p.hasXY()) m_planLines[p.m_Np.str()].push_back(i);
-            if (p.hasZ()) m_heightLines[p.m_Np.str()].push_back(i);
+            Entry& e = m_entries[m_ids.at(p.m_Np.str())];
+            if (p.hasXY()) m_planLines[e.planEnd++] = i;
+            if (p.hasZ()) m_heightLines[e.heightEnd++] = i;
         }
+        m_ids.reserve(m_ids.size() + observations);
+        m_entries.reserve(m_entries.size() + observations);
+        m_result.shots.reserve(observations);
+        m_nextShot.reserve(observations);
+        m_computedOrder.reserve(observations);
     }
 
-    // Rule of the station coordinates: the last Point line before the
-    // element, else the first after it; -1 when none.
-    static int LineFor(const std::unordered_map<std::string, std::vector<int>>& lines, const std::string& name,
-                       int element) {
-        const auto found = lines.find(name);
-        if (found == lines.end()) return -1;
-        const std::vector<int>& at = found->second;
-        const auto after = std::upper_bound(at.begin(), at.end(), element);
-        return after != at.begin() ? *(after - 1) : *after;
+    // Rule of the station coordinates: of the lines [begin, end), the last
+    // before the element, else the first after it; -1 when none.
+    static int LineFor(const std::vector<int>& lines, int begin, int end, int element) {
+        if (begin == end) return -1;
+        const auto after = std::upper_bound(lines.begin() + begin, lines.begin() + end, element);
+        return after != lines.begin() + begin ? *(after - 1) : *after;
+    }
+    int PlanLine(const Entry& e, int element) const { return LineFor(m_planLines, e.planBegin, e.planEnd, element); }
+    int HeightLine(const Entry& e, int element) const {
+        return LineFor(m_heightLines, e.heightBegin, e.heightEnd, element);
     }
 
     struct Position {
@@ -234,29 +289,28 @@ private:
 
     // Where a number stands as seen from `element`: known points first, then
     // what earlier set-ups computed.
-    Position PositionOf(const std::string& name, int element) const {
+    Position PositionOf(std::string_view name, int element) {
         Position p;
-        const int line = LineFor(m_planLines, name, element);
-        const auto computed = m_computed.find(name);
+        const Entry& e = m_entries[Id(name)];
+        const int line = PlanLine(e, element);
         if (line >= 0) {
             p.plan = true;
             p.x = PointAt(line).m_X;
             p.y = PointAt(line).m_Y;
             p.from = StationFrom::KnownPoint;
             p.element = line;
-        } else if (computed != m_computed.end() && computed->second.plan > 0) {
-            const Accumulator& a = computed->second;
+        } else if (e.plan > 0) {
             p.plan = true;
-            p.x = a.sx / a.plan;
-            p.y = a.sy / a.plan;
+            p.x = e.sx / e.plan;
+            p.y = e.sy / e.plan;
             p.from = StationFrom::ComputedPoint;
-            p.element = m_result.shots[a.shots.front()].element;
+            p.element = m_result.shots[e.first].element;
         }
-        const int heightLine = LineFor(m_heightLines, name, element);
+        const int heightLine = HeightLine(e, element);
         if (heightLine >= 0)
             p.z = PointAt(heightLine).m_Z;
-        else if (computed != m_computed.end() && computed->second.height > 0)
-            p.z = computed->second.sz / computed->second.height;
+        else if (e.height > 0)
+            p.z = e.sz / e.height;
         return p;
     }
 
@@ -344,7 +398,7 @@ private:
         std::vector<std::pair<int, Reduced>> reduced;
         for (int i : observations) {
             std::string why;
-            if (Name(i) == set.station) {
+            if (NameView(i) == set.station) {
                 LeaveOut(i, Name(i), "sight to the station itself");
                 continue;
             }
@@ -375,7 +429,7 @@ private:
         double sum = 0, weights = 0, first = 0;
         for (const auto& [i, r] : reduced) {
             if (m_book.typAt(i) != TypeCode<CReference>::value) continue;
-            const Position target = PositionOf(Name(i), set.element);
+            const Position target = PositionOf(NameView(i), set.element);
             if (!target.plan) continue;
             ReferenceCheck check;
             check.element = i;
@@ -430,9 +484,10 @@ private:
         shot.bearing = Bearing(set.x, set.y, x, y);
         shot.distance = std::hypot(x - set.x, y - set.y);
         ++set.computed;
-        auto [entry, fresh] = m_computed.try_emplace(shot.name);
-        if (fresh) m_computedOrder.push_back(shot.name);
-        Accumulator& a = entry->second;
+        const int id = Id(NameView(i));
+        Entry& a = m_entries[id];
+        if (!a.computed) m_computedOrder.push_back(id);
+        a.computed = true;
         ++a.plan;
         a.sx += x;
         a.sy += y;
@@ -440,41 +495,45 @@ private:
             ++a.height;
             a.sz += *shot.z;
         }
-        a.shots.push_back(m_result.shots.size());
+        const size_t index = m_result.shots.size();
+        (a.last == kNone ? a.first : m_nextShot[a.last]) = index;
+        a.last = index;
+        m_nextShot.push_back(kNone);
         m_result.shots.push_back(std::move(shot));
     }
 
     // The coordinates each point keeps: a locked axis its Point line's; else
     // the mean of the determinations, the Point line's own counting as one.
     void Adopt() {
-        std::unordered_map<std::string, size_t> known;  // number -> index into points
-        for (int i = 0; i < m_book.length(); ++i) {
+        const int end = m_book.length();
+        m_result.points.reserve(m_entries.size());
+        for (int i = 0; i < end; ++i) {
             if (m_book.typAt(i) != TypeCode<CPointGen>::value) continue;
             const CPointGen& p = PointAt(i);
-            if ((!p.hasXY() && !p.hasZ()) || known.count(p.m_Np.str())) continue;
-            known.emplace(p.m_Np.str(), m_result.points.size());
+            Entry& e = m_entries[m_ids.at(p.m_Np.str())];
+            if ((!p.hasXY() && !p.hasZ()) || e.point >= 0) continue;
+            e.point = static_cast<int>(m_result.points.size());
             ComputedPoint point;
             point.name = p.m_Np.str();
             point.code = p.m_Sy.str();
             // The last line of a number with a position is the one in force at the end.
-            const int plan = LineFor(m_planLines, point.name, m_book.length());
-            const int height = LineFor(m_heightLines, point.name, m_book.length());
+            const int plan = PlanLine(e, end), height = HeightLine(e, end);
             if (plan >= 0) point.x = PointAt(plan).m_X, point.y = PointAt(plan).m_Y;
             if (height >= 0) point.z = PointAt(height).m_Z;
-            m_result.points.push_back(point);
+            m_result.points.push_back(std::move(point));
         }
-        for (const std::string& name : m_computedOrder) {
-            const Accumulator& a = m_computed.at(name);
-            const auto k = known.find(name);
-            const int line = k == known.end() ? -1 : LineFor(m_planLines, name, m_book.length());
-            const int heightLine = k == known.end() ? -1 : LineFor(m_heightLines, name, m_book.length());
+        for (int id : m_computedOrder) {
+            const Entry& a = m_entries[id];
+            const bool known = a.point >= 0;
+            const int line = known ? PlanLine(a, end) : -1;
+            const int heightLine = known ? HeightLine(a, end) : -1;
             const bool lockedPlan = line >= 0 && PointAt(line).isXConst();
             const bool lockedHeight = heightLine >= 0 && PointAt(heightLine).isZConst();
             ComputedPoint fresh;
-            ComputedPoint& point = k == known.end() ? fresh : m_result.points[k->second];
-            if (k == known.end()) {
-                point.name = name;
-                point.code = m_result.shots[a.shots.front()].code;
+            ComputedPoint& point = known ? m_result.points[a.point] : fresh;
+            if (!known) {
+                point.name = m_result.shots[a.first].name;
+                point.code = m_result.shots[a.first].code;
             }
             const int planCount = a.plan + (point.x && !lockedPlan ? 1 : 0);
             const int heightCount = a.height + (point.z && !lockedHeight ? 1 : 0);
@@ -487,11 +546,11 @@ private:
             if (!lockedHeight && heightCount > 0) point.z = (a.sz + (point.z ? *point.z : 0)) / heightCount;
             if (lockedPlan || lockedHeight || planCount > 1 || heightCount > 1) {
                 Determinations d;
-                d.name = name;
+                d.name = point.name;
                 d.count = a.plan;
                 d.lockedPlan = lockedPlan;
                 d.lockedHeight = lockedHeight;
-                for (size_t s : a.shots) {
+                for (size_t s = a.first; s != kNone; s = m_nextShot[s]) {
                     const Shot& shot = m_result.shots[s];
                     d.planSpread = std::max(d.planSpread, std::hypot(shot.x - *point.x, shot.y - *point.y));
                     if (shot.z && point.z)
@@ -501,7 +560,7 @@ private:
                             d.heightSpread.value_or(0.0) > m_result.options.tolAltitudes;
                 m_result.multiples.push_back(d);
             }
-            if (k == known.end()) m_result.points.push_back(fresh);
+            if (!known) m_result.points.push_back(std::move(fresh));
         }
     }
 };
