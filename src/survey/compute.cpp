@@ -202,6 +202,8 @@ private:
     double m_factor = 1;
     // The one index of the point numbers of the book: a number (viewed in
     // the book's own text) to its entry.
+    // Its keys view the book's own texts, which outlive it: never a copy
+    // such as SetUp::station, which moves when the set-ups grow.
     std::unordered_map<std::string_view, int> m_ids;
     std::vector<Entry> m_entries;
     // The Point lines with a plan position, and with a height, grouped by
@@ -216,6 +218,7 @@ private:
     const CReference& ObservationAt(int i) const { return *static_cast<const CReference*>(m_book.ptrAt(i)); }
     std::string Name(int i) const { return ObservationAt(i).Np().str(); }
     std::string_view NameView(int i) const { return ObservationAt(i).Np().str(); }
+    std::string_view StationName(int i) const { return static_cast<const CStation*>(m_book.ptrAt(i))->Np().str(); }
 
     int Id(std::string_view name) {
         const auto [at, fresh] = m_ids.try_emplace(name, static_cast<int>(m_entries.size()));
@@ -385,7 +388,7 @@ private:
         SetUp& set = m_result.setUps[m_current];
         const std::vector<int> observations = std::move(m_observations);
         m_observations.clear();
-        const Position at = PositionOf(set.station, set.element);
+        const Position at = PositionOf(StationName(set.element), set.element);
         set.from = at.from;
         set.fromElement = at.element;
         set.x = at.x;
